@@ -51,4 +51,30 @@
 #define StrICmp VELKO_002012
 #define WStrICmp VELKO_002037
 
+/* Tokenizing and splitting */
+#define StrToken VELKO_002023
+#define WStrToken VELKO_002050
+#define StrSplit VELKO_002021
+#define WStrSplit VELKO_002048
+
+/* Trimming */
+#define StrTrim VELKO_002024
+#define WStrTrim VELKO_002051
+
+/* Replacing */
+#define StrReplace VELKO_002020
+#define WStrReplace VELKO_002047
+
+/* Integer text conversion */
+#define IntToStr VELKO_002003
+#define IntToWStr VELKO_002004
+#define StrToInt VELKO_002000
+#define WStrToInt VELKO_002053
+
+/* Width conversion */
+#define BytesToWords VELKO_002002
+#define StrToWStr VELKO_002001
+#define WStrToStr VELKO_002029
+#define WStrToWords VELKO_002028
+
 #endif

@@ -204,6 +204,145 @@ int WStrICmp(const WCHAR* str1, const WCHAR* str2);
 
 /**@}*/
 
+/**
+ * @name Tokenizing and splitting
+ * A token is a maximal run of units that are not in the delimiter set `dlmt`, so it is never
+ * empty. `dlmt` is a text; the order and repetition of its units do not matter, and an empty one
+ * makes the whole rest of `str` one token. `str` is cut in place: the one delimiter that ends a
+ * token is overwritten with the terminator, and no other unit is written.
+ */
+/**@{*/
+
+/**
+ * Returns the next token of `str` that begins at or after the index `*off`, or null when only
+ * delimiters remain. Set `*off` to 0 before the first call. Each call leaves it after the
+ * delimiter that it overwrote, or at the index of the terminator, where every further call returns
+ * null again. It must lie within the uncut text: an index outside is not detected. If an argument
+ * is null, the result is null and `*off` stays.
+ *
+ * A walk's state is `*off` alone, so walks over different texts may alternate, and each call may
+ * pass another `dlmt`.
+ */
+char* StrToken(char* str, int* off, const char* dlmt);
+/** Wide twin of StrToken(). */
+WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt);
+
+/**
+ * Cuts `str` into all its tokens, stores a pointer to each in `wrd`, and returns their number; 0
+ * if an argument is null. Entries past that number are not written. `wrd` has room for all tokens:
+ * (length + 1) / 2 entries always suffice, too few are not detected.
+ */
+int StrSplit(char* str, const char* dlmt, char** wrd);
+/** Wide twin of StrSplit(). */
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd);
+
+/**@}*/
+
+/** @name Trimming */
+/**@{*/
+
+/**
+ * Removes the units of the set `trimSet` from both ends of `str` in place and returns the new
+ * length. The kept text is moved to the start of `str` and terminated; the units after its
+ * terminator are left as they are. The terminator is written again even if nothing is removed, so
+ * `str` must be writable. A null or empty `trimSet` removes nothing; a null `str` gives 0.
+ */
+int StrTrim(char* str, const char* trimSet);
+/** Wide twin of StrTrim(). */
+int WStrTrim(WCHAR* str, const WCHAR* trimSet);
+
+/**@}*/
+
+/** @name Replacing */
+/**@{*/
+
+/**
+ * Writes `orig` to `result` with every occurrence of `rep` replaced by `with`, and returns the
+ * length of the new text. Occurrences are found from left to right and do not overlap; the
+ * replacement is not searched again. An empty `with` deletes the occurrences.
+ *
+ * With a null `result` nothing is written and the length that the new text will have is returned:
+ * call once to size the buffer, provide that many units + 1, and call again to fill it. A smaller
+ * buffer is not detected. `result` must not overlap the other texts, except that it may be `orig`
+ * itself if `rep` does not occur in it.
+ *
+ * If `orig`, `rep` or `with` is null or `rep` is empty, the result is 0 and nothing is written, not
+ * even a terminator.
+ */
+int StrReplace(const char* orig, const char* rep, const char* with, char* result);
+/** Wide twin of StrReplace(). */
+int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result);
+
+/**@}*/
+
+/** @name Integer text conversion */
+/**@{*/
+
+/**
+ * Writes the text of `value` in `radix` to `string` and returns `string`; null if it is null. The
+ * text is a "-" if the value is negative, then its digits without leading zeros: "0" to "9", then
+ * "a" to "z", then the units that follow "z" for digits above 35. It takes, with its terminator,
+ * at most 34 units in radix 2, 13 in radix 8, 12 in radix 10, 10 in radix 16 and 8 in radix 36;
+ * nothing after it is written.
+ *
+ * Every value is written so, the most negative one included. A radix below 1 gives the empty text,
+ * and so does radix 1, which has no text for them, with any value but 0.
+ */
+char* IntToStr(int value, char* string, int radix);
+/** Wide twin of IntToStr(). */
+WCHAR* IntToWStr(int value, WCHAR* string, int radix);
+
+/**
+ * Returns the decimal integer at the start of `string`: spaces and tabs, an optional "-", digits.
+ * Reading ends at the first other unit, which is ignored with all that follows. Text that does not
+ * begin so gives 0, a "+" or a space after the "-" included, and so does null. A value too large
+ * for an int is not detected: it wraps modulo 2^32.
+ */
+int StrToInt(const char* string);
+/** Wide twin of StrToInt(). */
+int WStrToInt(const WCHAR* string);
+
+/**@}*/
+
+/** @name Width conversion */
+/**@{*/
+
+/**
+ * Copies `len` bytes of `src` to `des`, each widened to 16 bits; a byte of 128 or above stays
+ * positive. No terminator is looked for or written. With a null pointer or `len` below 1, nothing
+ * is written. The copy runs forward, one unit after the other, also where the arrays overlap.
+ */
+void BytesToWords(const char* src, WORD* des, int len);
+
+/**
+ * Widens as much of `src` as fits into the capacity `bufsize` of `des`, at most `bufsize` - 1
+ * units, then the terminator, and returns `des`; null if it is null. A null `src` empties `des`.
+ * So does a `bufsize` below 2, 0 and negative ones included: `des` must have room for one unit in
+ * any case. A cut is not reported.
+ */
+WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize);
+
+/**
+ * Writes `src` as printable text to `des`, within its capacity `bufsize`, and returns `des`. The
+ * units 32 to 126 are written as they are, every other one as an escape: "&(0x", its value in
+ * hexadecimal without leading zeros, ")". An "&" is not escaped itself, so the text cannot be
+ * read back for certain. It ends before the first unit or escape that does not fit whole with the
+ * terminator; a cut is not reported.
+ *
+ * A null `src` empties `des`. A `bufsize` below 1 is taken as 1: `des` must have room for one unit
+ * in any case. A null `des` gives a constant empty text, which must not be written to.
+ */
+char* WStrToStr(const WCHAR* src, char* des, int bufsize);
+
+/**
+ * Copies `len` units of `src` to `des`. No terminator is looked for or written. With a null
+ * pointer or `len` below 1, nothing is written. The copy runs forward, one unit after the other,
+ * also where the arrays overlap.
+ */
+void WStrToWords(const WCHAR* src, WORD* des, int len);
+
+/**@}*/
+
 #ifdef __cplusplus
 }
 #endif

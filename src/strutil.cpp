@@ -288,3 +288,219 @@ int StrICmp(const char* str1, const char* str2) {
 int WStrICmp(const WCHAR* str1, const WCHAR* str2) {
   return compare<IgnoreCase>(str1, str2, Unbounded{});
 }
+
+// Tokenizing and splitting
+
+namespace {
+
+bool contains(const char* set, char unit) { return StrChr(set, unit) != nullptr; }
+bool contains(const WCHAR* set, WCHAR unit) { return WStrChr(set, unit) != nullptr; }
+
+template <typename Unit>
+Unit* token(Unit* str, int* off, const Unit* dlmt) {
+  if (!str || !off || !dlmt) return nullptr;
+  Unit* start = str + *off;
+  while (contains(dlmt, *start)) ++start;  // no set contains the terminator
+  Unit* end = start;
+  while (*end != 0 && !contains(dlmt, *end)) ++end;
+  *off = static_cast<int>(end - str);
+  if (*end != 0) {
+    *end = 0;
+    ++*off;
+  }
+  return end == start ? nullptr : start;
+}
+
+char* next(char* str, int* off, const char* dlmt) { return StrToken(str, off, dlmt); }
+WCHAR* next(WCHAR* str, int* off, const WCHAR* dlmt) { return WStrToken(str, off, dlmt); }
+
+template <typename Unit>
+int split(Unit* str, const Unit* dlmt, Unit** wrd) {
+  if (!wrd) return 0;
+  int off = 0;
+  int num = 0;
+  while (Unit* tk = next(str, &off, dlmt)) wrd[num++] = tk;
+  return num;
+}
+
+}  // namespace
+
+char* StrToken(char* str, int* off, const char* dlmt) { return token(str, off, dlmt); }
+WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) { return token(str, off, dlmt); }
+
+int StrSplit(char* str, const char* dlmt, char** wrd) { return split(str, dlmt, wrd); }
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dlmt, wrd); }
+
+// Trimming
+
+namespace {
+
+template <typename Unit>
+int trim(Unit* str, const Unit* trimSet) {
+  if (!str) return 0;
+  Unit* first = str;
+  while (contains(trimSet, *first)) ++first;
+  Unit* end = first + len(first);
+  while (end > first + 1 && contains(trimSet, end[-1])) --end;
+  *end = 0;
+  const int kept = static_cast<int>(end - first);
+  copy(str, first);
+  return kept;
+}
+
+}  // namespace
+
+int StrTrim(char* str, const char* trimSet) { return trim(str, trimSet); }
+int WStrTrim(WCHAR* str, const WCHAR* trimSet) { return trim(str, trimSet); }
+
+// Replacing
+
+namespace {
+
+const char* search(const char* str, const char* substr) { return StrStr(str, substr); }
+const WCHAR* search(const WCHAR* str, const WCHAR* substr) { return WStrStr(str, substr); }
+
+// The building pass finds the occurrences of the counting pass again: to remember them would take
+// memory that the library does not have.
+template <typename Unit>
+int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
+  if (!orig || !rep || *rep == 0 || !with) return 0;
+  const int len_rep = len(rep);
+  const int len_with = len(with);
+  int count = 0;
+  for (const Unit* ins = search(orig, rep); ins; ins = search(ins + len_rep, rep)) ++count;
+  if (!result) return count * (len_with - len_rep) + len(orig);
+  Unit* tmp = result;
+  for (; count > 0; --count) {
+    const Unit* const ins = search(orig, rep);
+    const int len_front = static_cast<int>(ins - orig);
+    nCopy(tmp, orig, len_front);
+    tmp += len_front;
+    copy(tmp, with);
+    tmp += len_with;
+    orig = ins + len_rep;
+  }
+  copy(tmp, orig);
+  return len(result);
+}
+
+}  // namespace
+
+int StrReplace(const char* orig, const char* rep, const char* with, char* result) {
+  return replace(orig, rep, with, result);
+}
+int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) {
+  return replace(orig, rep, with, result);
+}
+
+// Integer text conversion
+
+namespace {
+
+// Works on the negative of the magnitude, which exists for every int. A variable radix makes one
+// division of the quotient and the remainder.
+template <typename Unit>
+Unit* fromInt(int value, Unit* string, int radix) {
+  if (!string) return nullptr;
+  *string = 0;
+  if (radix < 1 || (radix == 1 && value != 0)) return string;
+  const bool negative = value < 0;
+  if (!negative) value = -value;
+  Unit* end = string;
+  do {
+    const int digit = -(value % radix);
+    value /= radix;
+    *end++ = static_cast<Unit>(digit < 10 ? '0' + digit : 'a' - 10 + digit);
+  } while (value != 0);
+  if (negative) *end++ = '-';
+  *end = 0;
+  for (Unit* start = string; start < --end; ++start) {
+    const Unit unit = *start;
+    *start = *end;
+    *end = unit;
+  }
+  return string;
+}
+
+template <typename Unit>
+int toInt(const Unit* string) {
+  if (!string) return 0;
+  while (*string == ' ' || *string == '\t') ++string;
+  const bool negative = *string == '-';
+  if (negative) ++string;
+  unsigned val = 0;
+  walk(
+      [&val](unsigned unit) {
+        const unsigned digit = unit - '0';
+        if (digit > 9) return true;
+        val = val * 10 + digit;
+        return false;
+      },
+      string);
+  return static_cast<int>(negative ? 0 - val : val);
+}
+
+}  // namespace
+
+char* IntToStr(int value, char* string, int radix) { return fromInt(value, string, radix); }
+WCHAR* IntToWStr(int value, WCHAR* string, int radix) { return fromInt(value, string, radix); }
+
+int StrToInt(const char* string) { return toInt(string); }
+int WStrToInt(const WCHAR* string) { return toInt(string); }
+
+// Width conversion
+
+namespace {
+
+template <typename Unit>
+void toWords(const Unit* src, WORD* des, Count len) {
+  if (!src || !des) return;
+  walk(
+      [&len](const Unit& from, WORD& to) {
+        if (len.spent()) return true;
+        to = from;
+        return false;
+      },
+      src, des);
+}
+
+// The library's only constant data. The other end of an escape is cheaper put together in place.
+constexpr char emptyText[] = "";
+constexpr char escapeStart[] = "&(0x";
+
+}  // namespace
+
+void BytesToWords(const char* src, WORD* des, int len) { toWords(src, des, Count{len}); }
+
+WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
+  if (!des) return nullptr;
+  *des = 0;
+  if (src) *copyUnits(des, src, Count{bufsize < 1 ? 0 : bufsize - 1}) = 0;
+  return des;
+}
+
+char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
+  if (!des) return const_cast<char*>(emptyText);
+  *des = 0;
+  if (!src) return des;
+  const char escapeEnd[] = {')', 0};
+  int i = 0;
+  for (; *src != 0; ++src) {
+    if (*src >= ' ' && *src <= '~') {
+      if (i + 1 >= bufsize) break;
+      des[i] = static_cast<char>(*src);
+      des[++i] = 0;
+    } else {
+      char strbuf[5];
+      const int digits = StrLen(IntToStr(*src, strbuf, 16));
+      if (i + digits + 5 >= bufsize) break;
+      StrCat(des + i, escapeStart);
+      StrCat(des + i, strbuf);
+      StrCat(des + i, escapeEnd);
+      i += StrLen(des + i);
+    }
+  }
+  return des;
+}
+
+void WStrToWords(const WCHAR* src, WORD* des, int len) { toWords(src, des, Count{len}); }

@@ -32,9 +32,9 @@ using namespace std::string_literals;
 using Units = std::u16string;
 
 template <typename Unit>
-Units valuesOf(const Unit* from, const Unit* to) {
+Units valuesOf(const std::vector<Unit>& units) {
   Units values;
-  for (; from != to; ++from) values += static_cast<std::make_unsigned_t<Unit>>(*from);
+  for (const Unit unit : units) values += static_cast<std::make_unsigned_t<Unit>>(unit);
   return values;
 }
 
@@ -81,12 +81,12 @@ class Buffer {
         now(exact<Unit>(before)) {}
 
   Unit* get() { return now.data() + margin; }
-  int indexOf(const Unit* unit) { return static_cast<int>(unit - get()); }
+  int indexOf(const Unit* unit) { return unit ? static_cast<int>(unit - get()) : -1; }
 
   // Checks that the buffer starts with `written` and that no other unit has changed.
   void check(const Units& written) {
-    const Units expected = before.replace(margin, written.size(), written);
-    CHECK(show(valuesOf(now.data(), now.data() + now.size())) == show(expected));
+    const std::vector<Unit> expected = exact<Unit>(before.replace(margin, written.size(), written));
+    CHECK(show(valuesOf(now)) == show(valuesOf(expected)));
   }
 
  private:

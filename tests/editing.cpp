@@ -1,0 +1,176 @@
+#include "model.h"
+#include "support.h"
+
+TWIN(Token)
+TWIN(Split)
+TWIN(Trim)
+TWIN(Replace)
+
+namespace {
+
+const std::vector<Units> texts = allTexts(u"a,;\u00e9", 4);
+const std::vector<Units> sets = {u"", u",", u",;", u";,;,", u"\u00e9", u"\u00e9a;,"};
+
+TEST_SUITE_BEGIN("Tokenizing and splitting");
+
+TEST_CASE_TEMPLATE("StrToken walks from any offset to the end and stays there", Unit, char, WCHAR) {
+  for (const Units& text : texts) {
+    for (const Units& set : sets) {
+      Text<Unit> dlmt(set);
+      for (int start = 0; start <= static_cast<int>(text.size()); ++start) {
+        CAPTURE(show(text));
+        CAPTURE(show(set));
+        CAPTURE(start);
+        Buffer<Unit> str(text + u'\0', text.size() + 1);
+        Units cut = text;
+        int off = start;
+        int expectedOff = start;
+        for (int ends = 0; ends < 2;) {
+          const int expected = model::token(cut, expectedOff, set);
+          CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, dlmt.get())) == expected);
+          CHECK(off == expectedOff);
+          if (expected < 0) ++ends;
+        }
+        str.check(cut + u'\0');
+      }
+    }
+  }
+}
+
+TEST_CASE_TEMPLATE("StrSplit stores all tokens and no entry more", Unit, char, WCHAR) {
+  for (const Units& text : texts) {
+    for (const Units& set : sets) {
+      CAPTURE(show(text));
+      CAPTURE(show(set));
+      Buffer<Unit> str(text + u'\0', text.size() + 1);
+      Units cut = text;
+      std::vector<int> expected;
+      int off = 0;
+      while (!cut.empty()) {
+        expected.push_back(model::token(cut, off, set));
+        if (expected.back() < 0) break;
+      }
+      const size_t count = expected.empty() ? 0 : expected.size() - 1;
+      Unit untouched{};
+      std::vector<Unit*> wrd(count + 1, &untouched);
+      CHECK(twin::Split<Unit>(str.get(), Text<Unit>(set).get(), wrd.data()) ==
+            static_cast<int>(count));
+      for (size_t i = 0; i < count; ++i) CHECK(str.indexOf(wrd[i]) == expected[i]);
+      CHECK(wrd[count] == &untouched);
+      str.check(cut + u'\0');
+    }
+  }
+}
+
+TEST_CASE_TEMPLATE("StrToken takes another set at each call", Unit, char, WCHAR) {
+  Buffer<Unit> str(u"key = a=b;c\0"s);
+  int off = 0;
+  CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u" =").get())) == 0);
+  CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u" ;").get())) == 4);
+  CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u"").get())) == 6);
+  str.check(u"key\0=\0a=b;c\0"s);
+}
+
+TEST_CASE_TEMPLATE("StrToken and StrSplit answer null and write nothing", Unit, char, WCHAR) {
+  Buffer<Unit> str(u"a,b\0"s);
+  Text<Unit> dlmt(u",");
+  int off = 1;
+  CHECK(twin::Token<Unit>(nullptr, &off, dlmt.get()) == nullptr);
+  CHECK(twin::Token<Unit>(str.get(), nullptr, dlmt.get()) == nullptr);
+  CHECK(twin::Token<Unit>(str.get(), &off, nullptr) == nullptr);
+  CHECK(off == 1);
+  Unit* wrd = nullptr;
+  CHECK(twin::Split<Unit>(nullptr, dlmt.get(), &wrd) == 0);
+  CHECK(twin::Split<Unit>(str.get(), nullptr, &wrd) == 0);
+  CHECK(twin::Split<Unit>(str.get(), dlmt.get(), nullptr) == 0);
+  CHECK(wrd == nullptr);
+  str.check(u"a,b\0"s);
+}
+
+TEST_SUITE_END();
+TEST_SUITE_BEGIN("Trimming");
+
+TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char, WCHAR) {
+  for (const Units& text : texts) {
+    for (const Units& set : sets) {
+      CAPTURE(show(text));
+      CAPTURE(show(set));
+      Buffer<Unit> str(text + u'\0', text.size() + 1);
+      Units expected = text;
+      const int kept = model::trim(expected, set);
+      CHECK(twin::Trim<Unit>(str.get(), Text<Unit>(set).get()) == kept);
+      str.check(expected);
+    }
+  }
+}
+
+TEST_CASE_TEMPLATE("StrTrim leaves the units behind the new terminator", Unit, char, WCHAR) {
+  Buffer<Unit> str(u"--ab-.\0"s);
+  CHECK(twin::Trim<Unit>(str.get(), Text<Unit>(u"-.").get()) == 2);
+  str.check(u"ab\0b\0.\0"s);
+}
+
+TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {
+  Buffer<Unit> str(u" a \0"s);
+  CHECK(twin::Trim<Unit>(str.get(), nullptr) == 3);
+  str.check(u" a \0"s);
+  CHECK(twin::Trim<Unit>(nullptr, str.get()) == 0);
+}
+
+TEST_SUITE_END();
+TEST_SUITE_BEGIN("Replacing");
+
+template <typename Unit>
+void checkReplace(const Units& text, const Units& pattern, const Units& replacement) {
+  CAPTURE(show(text));
+  CAPTURE(show(pattern));
+  CAPTURE(show(replacement));
+  Text<Unit> orig(text);
+  Text<Unit> rep(pattern);
+  Text<Unit> with(replacement);
+  const Units expected = model::replace(text, pattern, replacement);
+  const int length = static_cast<int>(expected.size());
+  CHECK(twin::Replace<Unit>(orig.get(), rep.get(), with.get(), nullptr) == length);
+  Buffer<Unit> result(u"", expected.size() + 1);
+  CHECK(twin::Replace<Unit>(orig.get(), rep.get(), with.get(), result.get()) == length);
+  result.check(expected + u'\0');
+}
+
+TEST_CASE_TEMPLATE("StrReplace sizes and fills alike", Unit, char, WCHAR) {
+  const std::vector<Units> patterns = allTexts(u"ab", 3);
+  for (const Units& text : allTexts(u"ab", 5)) {
+    for (const Units& pattern : patterns) {
+      if (pattern.empty()) continue;
+      for (const Units& replacement : {u""s, u"a"s, pattern, u"ab\u00e9"s, pattern + pattern}) {
+        checkReplace<Unit>(text, pattern, replacement);
+      }
+    }
+  }
+  checkReplace<Unit>(u"Dear ${name}, ${name}: ${names}", u"${name}", u"Zo\u00eb Q.");
+}
+
+TEST_CASE_TEMPLATE("StrReplace writes nothing for null and for an empty pattern", Unit, char,
+                   WCHAR) {
+  Text<Unit> null(nullptr);
+  Text<Unit> empty(u"");
+  Text<Unit> a(u"a");
+  Text<Unit>* const rows[][3] = {
+      {&null, &a, &a}, {&a, &null, &a}, {&a, &a, &null}, {&a, &empty, &a}, {&a, &empty, &null}};
+  Buffer<Unit> result;
+  for (const auto& [orig, rep, with] : rows) {
+    CHECK(twin::Replace<Unit>(orig->get(), rep->get(), with->get(), nullptr) == 0);
+    CHECK(twin::Replace<Unit>(orig->get(), rep->get(), with->get(), result.get()) == 0);
+  }
+  result.check(u"");
+}
+
+TEST_CASE_TEMPLATE("StrReplace may write to its own text if nothing occurs", Unit, char, WCHAR) {
+  Buffer<Unit> text(u"hello\0"s);
+  CHECK(twin::Replace<Unit>(text.get(), Text<Unit>(u"xyz").get(), Text<Unit>(u"q").get(),
+                            text.get()) == 5);
+  text.check(u"hello\0"s);
+}
+
+TEST_SUITE_END();
+
+}  // namespace
