@@ -246,6 +246,19 @@ void answer(char* line) {
   printf("no command is called \"%s\"; try help\n", name);
 }
 
+// Reads a line, as much of it as `line` holds, and returns its whole length; -1 after the last one.
+int readLine(FILE* input, char* line) {
+  int length = 0;
+  int c = getc(input);
+  if (c == EOF) return -1;
+  for (; c != EOF && c != '\n'; c = getc(input)) {
+    if (length < lineSize - 1) line[length] = static_cast<char>(c);
+    ++length;
+  }
+  line[length < lineSize ? length : lineSize - 1] = 0;
+  return length;
+}
+
 }  // namespace
 
 int main() {
@@ -253,20 +266,17 @@ int main() {
   if (!input) return 1;
   const bool typed = isatty(fileno(input)) != 0;
   char line[lineSize];
-  printf("> ");
-  while (fgets(line, lineSize, input)) {
-    bool tooLong = false;
-    if (!StrChr(line, '\n')) {
-      for (int c = getc(input); c != EOF && c != '\n'; c = getc(input)) tooLong = true;
-    }
+  for (;;) {
+    printf("> ");
+    const int length = readLine(input, line);
+    if (length < 0) break;
     StrTrim(line, blanks);
     if (!typed) printf("%s\n", line);
-    if (tooLong) {
-      printf("too long: a line has at most %d units\n", lineSize - 1);
+    if (length >= lineSize) {
+      printf("%d units are too many: a line has at most %d\n", length, lineSize - 1);
     } else {
       answer(line);
     }
-    printf("> ");
   }
   printf("bye\n");
   return 0;
