@@ -7,30 +7,42 @@ static_assert(static_cast<char>(-1) > 0, "narrow units are 0 to 255: compile wit
 
 namespace {
 
-// The loop that all others are expressed through: passes the units that the pointers point at to
-// `stop`, one of each, and moves all pointers on by one unit until `stop` returns true. They are
-// left at the units that stopped it. Four steps a turn: the address arithmetic and the jump back
-// cost half as much as the rest of a simple step.
-template <typename Stop, typename... Unit>
-void walk(Stop stop, Unit*&... at) {
-  for (;; (..., (at += 4))) {
-    if (stop(at[0]...)) return;
-    if (stop(at[1]...)) return (..., void(at += 1));
-    if (stop(at[2]...)) return (..., void(at += 2));
-    if (stop(at[3]...)) return (..., void(at += 3));
-  }
-}
-
-// How many units may still be taken from a source.
+// Bounds of a walk: how many more units it may take.
 struct Count {
   int left;
 
-  bool spent() {
-    if (left <= 0) return true;
-    --left;
-    return false;
+  bool take(int units) {
+    if (left < units) return false;
+    left -= units;
+    return true;
   }
 };
+
+struct Endless {
+  static bool take(int) { return true; }
+};
+
+// Tells the compiler which way a walk mostly goes: a branch not taken is the cheaper one.
+constexpr bool rarely(bool condition) { return __builtin_expect(condition, false); }
+
+// The loop that all others are expressed through: passes the units that the pointers point at to
+// `stop`, one of each, and moves all pointers on by one unit, until `stop` returns true or the
+// bound is reached. The pointers are left at the units that stopped it, or after the last ones.
+// Returns whether it was stopped. Four steps a turn: the arithmetic and the jump back, and the test
+// of the bound, cost half as much as the rest of a simple step.
+template <typename Bound, typename Stop, typename... Unit>
+[[gnu::always_inline]] inline bool walk(Bound bound, Stop stop, Unit*&... at) {
+  for (; bound.take(4); (..., (at += 4))) {
+    if (rarely(stop(at[0]...))) return true;
+    if (rarely(stop(at[1]...))) return (..., (at += 1)), true;
+    if (rarely(stop(at[2]...))) return (..., (at += 2)), true;
+    if (rarely(stop(at[3]...))) return (..., (at += 3)), true;
+  }
+  for (; bound.take(1); (..., ++at)) {
+    if (stop(*at...)) return true;
+  }
+  return false;
+}
 
 constexpr int noLimit = 0x7fffffff;
 
@@ -41,7 +53,7 @@ constexpr int noLimit = 0x7fffffff;
 namespace {
 
 // What separates the two cases of a letter.
-constexpr unsigned caseBit = 'a' - 'A';
+constexpr int caseBit = 'a' - 'A';
 
 // Whether c is one of the 26 letters from `first` on.
 template <unsigned first>
@@ -50,19 +62,21 @@ bool isLetterFrom(unsigned c) {
 }
 
 template <typename Unit>
-int length(const Unit* str) {
+[[gnu::always_inline]] inline int length(const Unit* str) {
   if (!str) return 0;
   const Unit* end = str;
-  walk([](unsigned unit) { return unit == 0; }, end);
+  walk(
+      Endless{}, [](unsigned unit) { return unit == 0; }, end);
   return static_cast<int>(end - str);
 }
 
 // Gives the letters from `first` on their other case.
 template <unsigned first, typename Unit>
-Unit* switchCase(Unit* str) {
+[[gnu::always_inline]] inline Unit* switchCase(Unit* str) {
   if (!str) return nullptr;
   Unit* at = str;
   walk(
+      Endless{},
       [](Unit& unit) {
         if (!isLetterFrom<first>(unit)) return unit == 0;
         unit = static_cast<Unit>(unit ^ caseBit);
@@ -78,11 +92,11 @@ int StrLen(const char* str) { return length(str); }
 int WStrLen(const WCHAR* str) { return length(str); }
 
 int CharToLower(const int c) {
-  return isLetterFrom<'A'>(static_cast<unsigned>(c)) ? c + static_cast<int>(caseBit) : c;
+  return isLetterFrom<'A'>(static_cast<unsigned>(c)) ? c + caseBit : c;
 }
 
 int CharToUpper(const int c) {
-  return isLetterFrom<'a'>(static_cast<unsigned>(c)) ? c - static_cast<int>(caseBit) : c;
+  return isLetterFrom<'a'>(static_cast<unsigned>(c)) ? c - caseBit : c;
 }
 
 char* StrUpper(char* str) { return switchCase<'a'>(str); }
@@ -95,23 +109,24 @@ WCHAR* WStrLower(WCHAR* str) { return switchCase<'A'>(str); }
 
 namespace {
 
-// Copies up to the terminator, or `count` units without one, and returns where it ended.
-template <typename To, typename From>
-To* copyUnits(To* dst, const From* src, Count count) {
-  walk([&count](To& to, const From& from) { return count.spent() || (to = from) == 0; }, dst, src);
+// Copies up to the terminator, or up to the bound without one, and returns where it ended.
+template <typename To, typename From, typename Bound>
+[[gnu::always_inline]] inline To* copyUnits(To* dst, const From* src, Bound bound) {
+  walk(
+      bound, [](To& to, From from) { return (to = from) == 0; }, dst, src);
   return dst;
 }
 
 template <typename Unit>
-void copy(Unit* dst, const Unit* src) {
+[[gnu::always_inline]] inline void copy(Unit* dst, const Unit* src) {
   if (!dst || dst == src) return;
   *dst = 0;
   if (!src) return;
-  walk([](Unit& to, Unit from) { return (to = from) == 0; }, dst, src);
+  copyUnits(dst, src, Endless{});
 }
 
 template <typename Unit>
-void copyBuf(Unit* dst, int n, const Unit* src) {
+[[gnu::always_inline]] inline void copyBuf(Unit* dst, int n, const Unit* src) {
   if (!dst || dst == src || n < 1) return;
   *dst = 0;
   if (!src) return;
@@ -119,7 +134,7 @@ void copyBuf(Unit* dst, int n, const Unit* src) {
 }
 
 template <typename Unit>
-void nCopy(Unit* dst, const Unit* src, int n) {
+[[gnu::always_inline]] inline void nCopy(Unit* dst, const Unit* src, int n) {
   if (!dst || dst == src) return;
   *dst = 0;
   if (!src) return;
@@ -146,14 +161,13 @@ int len(const char* str) { return StrLen(str); }
 int len(const WCHAR* str) { return WStrLen(str); }
 
 template <typename Unit>
-void cat(Unit* dst, const Unit* src) {
+[[gnu::always_inline]] inline void cat(Unit* dst, const Unit* src) {
   if (!dst || !src) return;
-  dst += len(dst);
-  walk([](Unit& to, Unit from) { return (to = from) == 0; }, dst, src);
+  copyUnits(dst + len(dst), src, Endless{});
 }
 
 template <typename Unit>
-void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
+[[gnu::always_inline]] inline void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
   if (!dst || !src) return;
   const int off = len(dst);
   if (n <= off + 1) return;
@@ -177,42 +191,48 @@ void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) { nCatBuf(dst, n,
 
 namespace {
 
-// How searches and comparisons take units: as they are, or letters without their case. `other` is
-// the second unit that `map` maps to the same value, or that value where there is none.
+// How searches and comparisons take units: as they are, or letters without their case. Most units
+// that match are the same, so the rest is asked only of two that are not.
 struct Exact {
   static int map(int unit) { return unit; }
-  static int other(int mapped) { return mapped; }
+  static int other(int unit) { return unit; }  // the second unit that matches
+  static bool match(int, int) { return false; }
 };
 
 struct IgnoreCase {
   static int map(int unit) { return CharToLower(unit); }
-  static int other(int mapped) {
-    return isLetterFrom<'a'>(static_cast<unsigned>(mapped)) ? mapped - static_cast<int>(caseBit)
-                                                            : mapped;
+  static int other(int unit) { return match(unit, unit ^ caseBit) ? unit ^ caseBit : unit; }
+  static bool match(int a, int b) {
+    return (a ^ b) == caseBit && isLetterFrom<'a'>(static_cast<unsigned>(a | b));
   }
 };
 
 template <typename Unit>
-Unit* findUnit(const Unit* str, Unit c) {
+[[gnu::always_inline]] inline Unit* findUnit(const Unit* str, Unit c) {
   if (!str) return nullptr;
-  walk([c](Unit unit) { return unit == c || unit == 0; }, str);
+  walk(
+      Endless{}, [c](Unit unit) { return rarely(unit == c) || rarely(unit == 0); }, str);
   return *str == 0 ? nullptr : const_cast<Unit*>(str);
 }
 
 // Looks for the first unit of substr before it compares the rest. Where the rest fails at the
 // terminator of str, no later place has room for substr.
 template <typename Case, typename Unit>
-Unit* find(const Unit* str, const Unit* substr) {
+[[gnu::always_inline]] inline Unit* find(const Unit* str, const Unit* substr) {
   if (!str || !substr || *str == 0) return nullptr;
   if (*substr == 0) return const_cast<Unit*>(str);
-  const int first = Case::map(*substr);
+  const int first = *substr;
   const int other = Case::other(first);
   for (;; ++str) {
-    walk([=](int unit) { return unit == first || unit == other || unit == 0; }, str);
+    walk(
+        Endless{}, [=](int unit) { return unit == first || unit == other || unit == 0; }, str);
     if (*str == 0) return nullptr;
     const Unit* at = str + 1;
     const Unit* rest = substr + 1;
-    walk([](int a, int b) { return b == 0 || (a != b && Case::map(a) != Case::map(b)); }, at, rest);
+    walk(
+        Endless{},
+        [](int a, int b) { return rarely(a != b) ? rarely(!Case::match(a, b)) : rarely(b == 0); },
+        at, rest);
     if (*rest == 0) return const_cast<Unit*>(str);
     if (*at == 0) return nullptr;
   }
@@ -233,26 +253,18 @@ WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) { return find<IgnoreCase>
 
 namespace {
 
-struct Unbounded {
-  static bool spent() { return false; }
-};
-
 // Returns 0, or the position i + 1 of the first difference: negative where str1 has the smaller
 // unit. Equal units map to equal values, so only unequal ones are mapped.
 template <typename Case, typename Unit, typename Bound>
-int compare(const Unit* str1, const Unit* str2, Bound bound) {
+[[gnu::always_inline]] inline int compare(const Unit* str1, const Unit* str2, Bound bound) {
   if (!str1 || !str2) return (str1 ? 1 : 0) - (str2 ? 1 : 0);
   if (str1 == str2) return 0;
-  int difference = 0;
   const Unit* at = str1;
-  walk(
-      [&](const Unit& a, const Unit& b) {
-        if (bound.spent()) return true;
-        if (a == b) return a == 0;
-        difference = Case::map(a) - Case::map(b);
-        return difference != 0;
-      },
-      at, str2);
+  const auto ends = [](int a, int b) {
+    return rarely(a != b) ? rarely(!Case::match(a, b)) : rarely(a == 0);
+  };
+  if (!walk(bound, ends, at, str2)) return 0;
+  const int difference = Case::map(*at) - Case::map(*str2);
   const int position = static_cast<int>(at - str1) + 1;
   return difference == 0 ? 0 : difference < 0 ? -position : position;
 }
@@ -277,49 +289,54 @@ int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) {
   return compare<IgnoreCase>(str1, str2, Count{n});
 }
 
-int StrCmp(const char* str1, const char* str2) { return compare<Exact>(str1, str2, Unbounded{}); }
-int WStrCmp(const WCHAR* str1, const WCHAR* str2) {
-  return compare<Exact>(str1, str2, Unbounded{});
-}
+int StrCmp(const char* str1, const char* str2) { return compare<Exact>(str1, str2, Endless{}); }
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) { return compare<Exact>(str1, str2, Endless{}); }
 
 int StrICmp(const char* str1, const char* str2) {
-  return compare<IgnoreCase>(str1, str2, Unbounded{});
+  return compare<IgnoreCase>(str1, str2, Endless{});
 }
 int WStrICmp(const WCHAR* str1, const WCHAR* str2) {
-  return compare<IgnoreCase>(str1, str2, Unbounded{});
+  return compare<IgnoreCase>(str1, str2, Endless{});
 }
 
 // Tokenizing and splitting
 
 namespace {
 
-bool contains(const char* set, char unit) { return StrChr(set, unit) != nullptr; }
-bool contains(const WCHAR* set, WCHAR unit) { return WStrChr(set, unit) != nullptr; }
-
+// StrChr for sets, which are short: a turn of the walk costs more than it saves. No set contains
+// the terminator.
 template <typename Unit>
-Unit* token(Unit* str, int* off, const Unit* dlmt) {
-  if (!str || !off || !dlmt) return nullptr;
-  Unit* start = str + *off;
-  while (contains(dlmt, *start)) ++start;  // no set contains the terminator
-  Unit* end = start;
-  while (*end != 0 && !contains(dlmt, *end)) ++end;
-  *off = static_cast<int>(end - str);
-  if (*end != 0) {
-    *end = 0;
-    ++*off;
+[[gnu::always_inline]] inline bool contains(const Unit* set, Unit unit) {
+  if (*set == unit) return unit != 0;
+  if (*set == 0) return false;
+  while (*++set != 0) {
+    if (*set == unit) return true;
   }
-  return end == start ? nullptr : start;
+  return false;
 }
 
-char* next(char* str, int* off, const char* dlmt) { return StrToken(str, off, dlmt); }
-WCHAR* next(WCHAR* str, int* off, const WCHAR* dlmt) { return WStrToken(str, off, dlmt); }
+template <typename Unit>
+[[gnu::always_inline]] inline Unit* token(Unit* str, int* off, const Unit* dlmt) {
+  if (!str || !off || !dlmt) return nullptr;
+  Unit* start = str + *off;
+  while (contains(dlmt, *start)) ++start;
+  *off = static_cast<int>(start - str);
+  if (*start == 0) return nullptr;
+  Unit* end = start + 1;
+  while (*end != 0 && !contains(dlmt, *end)) ++end;
+  *off = static_cast<int>(end - str);
+  if (*end == 0) return start;
+  *end = 0;
+  ++*off;
+  return start;
+}
 
 template <typename Unit>
-int split(Unit* str, const Unit* dlmt, Unit** wrd) {
+[[gnu::always_inline]] inline int split(Unit* str, const Unit* dlmt, Unit** wrd) {
   if (!wrd) return 0;
   int off = 0;
   int num = 0;
-  while (Unit* tk = next(str, &off, dlmt)) wrd[num++] = tk;
+  while (Unit* tk = token(str, &off, dlmt)) wrd[num++] = tk;
   return num;
 }
 
@@ -336,9 +353,10 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dl
 namespace {
 
 template <typename Unit>
-int trim(Unit* str, const Unit* trimSet) {
+[[gnu::always_inline]] inline int trim(Unit* str, const Unit* trimSet) {
   if (!str) return 0;
   Unit* first = str;
+  if (!trimSet) trimSet = str + len(str);  // an empty set
   while (contains(trimSet, *first)) ++first;
   Unit* end = first + len(first);
   while (end > first + 1 && contains(trimSet, end[-1])) --end;
@@ -363,7 +381,8 @@ const WCHAR* search(const WCHAR* str, const WCHAR* substr) { return WStrStr(str,
 // The building pass finds the occurrences of the counting pass again: to remember them would take
 // memory that the library does not have.
 template <typename Unit>
-int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
+[[gnu::always_inline]] inline int replace(const Unit* orig, const Unit* rep, const Unit* with,
+                                          Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
   const int len_rep = len(rep);
   const int len_with = len(with);
@@ -397,19 +416,25 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* r
 
 namespace {
 
-// Works on the negative of the magnitude, which exists for every int. A variable radix makes one
-// division of the quotient and the remainder.
+constexpr int mostNegative = -noLimit - 1;
+
+// A variable radix makes one division of the quotient and the remainder. The most negative int has
+// no positive counterpart: its first division is of the value itself.
 template <typename Unit>
-Unit* fromInt(int value, Unit* string, int radix) {
+[[gnu::always_inline]] inline Unit* fromInt(int value, Unit* string, int radix) {
   if (!string) return nullptr;
   *string = 0;
   if (radix < 1 || (radix == 1 && value != 0)) return string;
   const bool negative = value < 0;
-  if (!negative) value = -value;
+  if (negative && value != mostNegative) value = -value;
   Unit* end = string;
   do {
-    const int digit = -(value % radix);
-    value /= radix;
+    int digit = value % radix;
+    value = value / radix;
+    if (rarely(value < 0)) {
+      value = -value;
+      digit = -digit;
+    }
     *end++ = static_cast<Unit>(digit < 10 ? '0' + digit : 'a' - 10 + digit);
   } while (value != 0);
   if (negative) *end++ = '-';
@@ -423,13 +448,14 @@ Unit* fromInt(int value, Unit* string, int radix) {
 }
 
 template <typename Unit>
-int toInt(const Unit* string) {
+[[gnu::always_inline]] inline int toInt(const Unit* string) {
   if (!string) return 0;
   while (*string == ' ' || *string == '\t') ++string;
   const bool negative = *string == '-';
   if (negative) ++string;
   unsigned val = 0;
   walk(
+      Endless{},
       [&val](unsigned unit) {
         const unsigned digit = unit - '0';
         if (digit > 9) return true;
@@ -453,15 +479,13 @@ int WStrToInt(const WCHAR* string) { return toInt(string); }
 namespace {
 
 template <typename Unit>
-void toWords(const Unit* src, WORD* des, Count len) {
+[[gnu::always_inline]] inline void toWords(const Unit* src, WORD* des, int len) {
   if (!src || !des) return;
-  walk(
-      [&len](const Unit& from, WORD& to) {
-        if (len.spent()) return true;
-        to = from;
-        return false;
-      },
-      src, des);
+  const auto copyOne = [](auto& to, auto from) {
+    to = from;
+    return false;
+  };
+  walk(Count{len}, copyOne, des, src);
 }
 
 // The library's only constant data. The other end of an escape is cheaper put together in place.
@@ -470,7 +494,7 @@ constexpr char escapeStart[] = "&(0x";
 
 }  // namespace
 
-void BytesToWords(const char* src, WORD* des, int len) { toWords(src, des, Count{len}); }
+void BytesToWords(const char* src, WORD* des, int len) { toWords(src, des, len); }
 
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
   if (!des) return nullptr;
@@ -503,4 +527,4 @@ char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
   return des;
 }
 
-void WStrToWords(const WCHAR* src, WORD* des, int len) { toWords(src, des, Count{len}); }
+void WStrToWords(const WCHAR* src, WORD* des, int len) { toWords(src, des, len); }
