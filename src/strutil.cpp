@@ -352,6 +352,9 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dl
 
 namespace {
 
+void copyText(char* dst, const char* src) { StrCopy(dst, src); }
+void copyText(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
+
 template <typename Unit>
 [[gnu::always_inline]] inline int trim(Unit* str, const Unit* trimSet) {
   if (!str) return 0;
@@ -362,7 +365,7 @@ template <typename Unit>
   while (end > first + 1 && contains(trimSet, end[-1])) --end;
   *end = 0;
   const int kept = static_cast<int>(end - first);
-  copy(str, first);
+  copyText(str, first);
   return kept;
 }
 
@@ -385,21 +388,17 @@ template <typename Unit>
                                           Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
   const int len_rep = len(rep);
-  const int len_with = len(with);
   int count = 0;
   for (const Unit* ins = search(orig, rep); ins; ins = search(ins + len_rep, rep)) ++count;
-  if (!result) return count * (len_with - len_rep) + len(orig);
+  if (!result) return count * (len(with) - len_rep) + len(orig);
   Unit* tmp = result;
   for (; count > 0; --count) {
     const Unit* const ins = search(orig, rep);
-    const int len_front = static_cast<int>(ins - orig);
-    nCopy(tmp, orig, len_front);
-    tmp += len_front;
-    copy(tmp, with);
-    tmp += len_with;
+    tmp = copyUnits(tmp, orig, Count{static_cast<int>(ins - orig)});
+    tmp = copyUnits(tmp, with, Endless{});
     orig = ins + len_rep;
   }
-  copy(tmp, orig);
+  copyText(tmp, orig);
   return len(result);
 }
 
@@ -478,23 +477,30 @@ int WStrToInt(const WCHAR* string) { return toInt(string); }
 
 namespace {
 
-template <typename Unit>
-[[gnu::always_inline]] inline void toWords(const Unit* src, WORD* des, int len) {
-  if (!src || !des) return;
-  const auto copyOne = [](auto& to, auto from) {
+template <typename To, typename From>
+[[gnu::always_inline]] inline void copyCount(To*& des, const From*& src, int count) {
+  const auto copyOne = [](To& to, From from) {
     to = from;
     return false;
   };
-  walk(Count{len}, copyOne, des, src);
+  walk(Count{count}, copyOne, des, src);
 }
 
-// The library's only constant data. The other end of an escape is cheaper put together in place.
+// Two units in one word. Word by word is also unit by unit, forward, where the arrays overlap: both
+// being aligned, they are an even number of units apart.
+using Pair [[gnu::may_alias]] = uint32_t;
+
+bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % sizeof(Pair) == 0; }
+
+// The library's only constant data.
 constexpr char emptyText[] = "";
 constexpr char escapeStart[] = "&(0x";
 
 }  // namespace
 
-void BytesToWords(const char* src, WORD* des, int len) { toWords(src, des, len); }
+void BytesToWords(const char* src, WORD* des, int len) {
+  if (src && des) copyCount(des, src, len);
+}
 
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
   if (!des) return nullptr;
@@ -505,26 +511,39 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
 
 char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
   if (!des) return const_cast<char*>(emptyText);
-  *des = 0;
-  if (!src) return des;
-  const char escapeEnd[] = {')', 0};
-  int i = 0;
-  for (; *src != 0; ++src) {
-    if (*src >= ' ' && *src <= '~') {
-      if (i + 1 >= bufsize) break;
-      des[i] = static_cast<char>(*src);
-      des[++i] = 0;
-    } else {
-      char strbuf[5];
-      const int digits = StrLen(IntToStr(*src, strbuf, 16));
-      if (i + digits + 5 >= bufsize) break;
-      StrCat(des + i, escapeStart);
-      StrCat(des + i, strbuf);
-      StrCat(des + i, escapeEnd);
-      i += StrLen(des + i);
-    }
+  const auto copyPrintable = [](char& to, WCHAR from) {
+    if (from < ' ' || from > '~') return true;
+    to = static_cast<char>(from);
+    return false;
+  };
+  char* at = des;
+  while (src) {
+    const int room = bufsize - static_cast<int>(at - des);  // the terminator's unit included
+    if (!walk(Count{room < 1 ? 0 : room - 1}, copyPrintable, at, src) || *src == 0) break;
+    char strbuf[5];
+    IntToStr(*src++, strbuf, 16);
+    if (static_cast<int>(at - des) + StrLen(strbuf) + 5 >= bufsize) break;
+    *at = 0;
+    StrCat(at, escapeStart);
+    StrCat(at, strbuf);
+    strbuf[0] = ')';
+    strbuf[1] = 0;
+    StrCat(at, strbuf);
+    at += StrLen(at);
   }
+  *at = 0;
   return des;
 }
 
-void WStrToWords(const WCHAR* src, WORD* des, int len) { toWords(src, des, len); }
+void WStrToWords(const WCHAR* src, WORD* des, int len) {
+  if (!src || !des || len < 1) return;
+  if (isAligned(src) && isAligned(des)) {
+    Pair* to = reinterpret_cast<Pair*>(des);
+    const Pair* from = reinterpret_cast<const Pair*>(src);
+    copyCount(to, from, len >> 1);
+    des = reinterpret_cast<WORD*>(to);
+    src = reinterpret_cast<const WCHAR*>(from);
+    len &= 1;
+  }
+  copyCount(des, src, len);
+}
