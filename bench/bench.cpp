@@ -1,5 +1,7 @@
 // bench IMAGES CALLGRAPH MARKDOWN: counts the cycles of every function beside the C libraries, the
 // obvious loops and the hand-written limit, checks all results, and writes the tables.
+#include <unistd.h>
+
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
@@ -31,7 +33,10 @@ struct Argument {
   bool isBuffer = true;
 };
 constexpr Argument number(int value) { return {value, false}; }
-constexpr Argument buffers[] = {{0}, {1}, {2}, {3}};
+constexpr Argument b0 = {0};
+constexpr Argument b1 = {1};
+constexpr Argument b2 = {2};
+constexpr Argument b3 = {3};
 
 // What a result is compared with. The order of two texts counts, not a number for it; an index is
 // that of the unit of buffer 0 that a result points at, -1 for null.
@@ -113,7 +118,6 @@ std::vector<Row> rowsFor(uint32_t unit) {
     rows.push_back({std::string(name) + about, symbol, name, wide ? "" : peer, sizes, call});
   };
 #define TWIN(name) wide ? "W" #name : #name, wide ? SYMBOL(W##name) : SYMBOL(name)
-  const auto [b0, b1, b2, b3] = buffers;
 
   add(TWIN(StrLen), "", "strlen", [=](int n) {
     return Call{{text(prose(n))}, {b0}, Result::number, n};
@@ -326,6 +330,7 @@ Outcome measure(Core& core, const std::string& who, const Function& function, co
 
   const auto values = [&](const std::vector<Argument>& arguments) {
     std::vector<uint32_t> registers;
+    registers.reserve(arguments.size());
     for (const Argument& argument : arguments) {
       registers.push_back(argument.isBuffer ? starts[length(argument.value)]
                                             : static_cast<uint32_t>(argument.value));
@@ -391,6 +396,7 @@ class Stack {
     }
   }
 
+  // NOLINTNEXTLINE(misc-no-recursion): the call graph that it walks has no cycle.
   int of(const std::string& function) const {
     int deepest = 0;
     const auto called = callees.find(function);
@@ -456,11 +462,11 @@ class Report {
   void measureAll() {
     for (const uint32_t unit : {1U, 2U}) {
       for (const Row& row : rowsFor(unit)) {
-        std::cerr << "\r\033[K" << row.name << std::flush;
+        if (isatty(STDERR_FILENO) != 0) std::cerr << "\r\033[K" << row.name << std::flush;
         rows.emplace_back(row, measureRow(row));
       }
     }
-    std::cerr << "\r\033[K";
+    if (isatty(STDERR_FILENO) != 0) std::cerr << "\r\033[K";
   }
 
   void write(std::ostream& out) {

@@ -163,13 +163,13 @@ int len(const WCHAR* str) { return WStrLen(str); }
 template <typename Unit>
 [[gnu::always_inline]] inline void cat(Unit* dst, const Unit* src) {
   if (!dst || !src) return;
-  copyUnits(dst + len(dst), src, Endless{});
+  copyUnits(dst + length(dst), src, Endless{});
 }
 
 template <typename Unit>
 [[gnu::always_inline]] inline void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
   if (!dst || !src) return;
-  const int off = len(dst);
+  const int off = length(dst);
   if (n <= off + 1) return;
   const int nMax = n - off - 1;
   *copyUnits(dst + off, src, Count{num < nMax ? num : nMax}) = 0;
@@ -526,10 +526,8 @@ char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
     *at = 0;
     StrCat(at, escapeStart);
     StrCat(at, strbuf);
-    strbuf[0] = ')';
-    strbuf[1] = 0;
-    StrCat(at, strbuf);
     at += StrLen(at);
+    *at++ = ')';
   }
   *at = 0;
   return des;

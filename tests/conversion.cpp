@@ -102,6 +102,9 @@ TEST_CASE("BytesToWords and WStrToWords run forward where the arrays overlap") {
   Buffer<WORD> words(u"\u4e2dbcdef");
   WStrToWords(words.get(), words.get() + 1, 5);
   words.check(Units(6, u'\u4e2d'));
+  alignas(4) WORD pairs[8] = {1, 2, 3, 4, 5, 6, 7, 8};
+  WStrToWords(pairs, pairs + 2, 5);
+  CHECK(show(Units(pairs, pairs + 8)) == show(u"\1\2\1\2\1\2\1\b"));
 
   WORD area[8] = {0x0102, 0x0304, 0x0506, 0x0708, 0x090A, 0x0B0C, 0x0D0E, 0x0F10};
   unsigned char expected[sizeof area];

@@ -66,12 +66,13 @@ TEST_CASE_TEMPLATE("StrUpper and StrLower change letters in place", Unit, char, 
   }
 }
 
-TEST_CASE_TEMPLATE("StrUpper and StrLower write only what changes", Unit, char, WCHAR) {
+TEST_CASE_TEMPLATE("StrUpper, StrLower and StrCatBuf write only what changes", Unit, char, WCHAR) {
   // Where constant data is protected, a write to it is a fault.
   static const Unit capitals[] = {'A', '1', 'Z', '{', '_', 0};
   static const Unit small[] = {'a', '1', 'z', '{', '_', 0};
   CHECK(twin::Upper<Unit>(const_cast<Unit*>(capitals)) == capitals);
   CHECK(twin::Lower<Unit>(const_cast<Unit*>(small)) == small);
+  twin::CatBuf<Unit>(const_cast<Unit*>(small), 6, capitals);
 }
 
 TEST_CASE("WStrUpper and WStrLower know no letters beyond ASCII") {
