@@ -74,8 +74,10 @@ TEST_CASE("BytesToWords and WStrToWords copy the count for every alignment") {
         CAPTURE(len);
         const Units written = model::take(units, len);
         // One unit of head room moves the exact memory off its alignment.
-        auto bytes = exact<char>(Units(static_cast<size_t>(from), u'-') + written);
-        auto wide = exact<WCHAR>(Units(static_cast<size_t>(from), u'-') + written);
+        const Units src =
+            Units(static_cast<size_t>(from), u'-') + model::take(units, std::max(len, 1));
+        auto bytes = exact<char>(src);
+        auto wide = exact<WCHAR>(src);
         const Units head(static_cast<size_t>(to), 0xB5);
         Buffer<WORD> widened;
         BytesToWords(bytes.data() + from, widened.get() + to, len);
@@ -138,7 +140,8 @@ TEST_CASE("WStrToStr escapes what is not printable and cuts between units") {
       u"a\u4e2db",  u"\u4e2db", u"&(",     u"\x1f ~\x7f", u"\u0080\u0100\u0fff\u1000\uffff",
       u"abcdefghij"};
   for (const Units& src : sources) {
-    for (int bufsize = -1; bufsize < 50; ++bufsize) {
+    for (int step = -2; step < 50; ++step) {
+      const int bufsize = step < -1 ? INT_MIN : step;
       CAPTURE(show(src));
       CAPTURE(bufsize);
       Buffer<char> des(u"", 64);
