@@ -1,11 +1,6 @@
-#include <climits>
 #include <cstring>
 
-#include "model.h"
-#include "support.h"
-
-NAMED_TWIN(FromInt, IntToStr, IntToWStr)
-TWIN(ToInt)
+#include "checks.h"
 
 namespace {
 
@@ -20,11 +15,7 @@ TEST_CASE_TEMPLATE("IntToStr writes every value in every radix", Unit, char, WCH
   const int radices[] = {INT_MIN, -3, 0, 1, 2, 3, 8, 10, 16, 36, 37, 170, 1000, 70000, INT_MAX};
   for (const int value : values) {
     for (const int radix : radices) {
-      CAPTURE(value);
-      CAPTURE(radix);
-      Buffer<Unit> string(u"", 34);
-      CHECK(twin::FromInt<Unit>(value, string.get(), radix) == string.get());
-      string.check(model::intToText(value, radix) + u'\0');
+      checkFromInt<Unit>(value, radix);
     }
   }
 }
@@ -51,9 +42,7 @@ TEST_CASE_TEMPLATE("StrToInt reads spaces, a sign and digits", Unit, char, WCHAR
         u"\u00b11",    u"\u00a01",     u"1\u00b2"}) {
     texts.emplace_back(text);
   }
-  for (const Units& text : texts) {
-    CHECK_MESSAGE(twin::ToInt<Unit>(Text<Unit>(text).get()) == model::textToInt(text), show(text));
-  }
+  for (const Units& text : texts) checkToInt<Unit>(text);
 }
 
 TEST_CASE("WStrToInt reads no digit, sign or space beyond ASCII") {
@@ -70,22 +59,7 @@ TEST_CASE("BytesToWords and WStrToWords copy the count for every alignment") {
   const Units units = u"a\0\u00ff\u0080z\0bcd"s;
   for (const int from : {0, 1}) {
     for (const int to : {0, 1}) {
-      for (int len = -1; len < 9; ++len) {
-        CAPTURE(len);
-        const Units written = model::take(units, len);
-        // One unit of head room moves the exact memory off its alignment.
-        const Units src =
-            Units(static_cast<size_t>(from), u'-') + model::take(units, std::max(len, 1));
-        auto bytes = exact<char>(src);
-        auto wide = exact<WCHAR>(src);
-        const Units head(static_cast<size_t>(to), 0xB5);
-        Buffer<WORD> widened;
-        BytesToWords(bytes.data() + from, widened.get() + to, len);
-        widened.check(head + written);
-        Buffer<WORD> copied;
-        WStrToWords(wide.data() + from, copied.get() + to, len);
-        copied.check(head + written);
-      }
+      for (int len = -1; len < 9; ++len) checkWords(units, len, from, to);
     }
   }
   for (const int len : {INT_MIN, 3}) {
@@ -120,17 +94,12 @@ TEST_CASE("BytesToWords and WStrToWords run forward where the arrays overlap") {
 }
 
 TEST_CASE("StrToWStr widens what fits") {
-  for (const Units& src : {u""s, u"\u00e9\u00ff"s, u"abcdefg"s}) {
-    for (const int bufsize : {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, INT_MAX}) {
-      CAPTURE(bufsize);
-      Buffer<WCHAR> des;
-      CHECK(StrToWStr(Text<char>(src).get(), des.get(), bufsize) == des.get());
-      des.check(model::copyBuf(std::max(bufsize, 1), src));
-      Buffer<WCHAR> emptied;
-      CHECK(StrToWStr(nullptr, emptied.get(), bufsize) == emptied.get());
-      emptied.check(u"\0"s);
-      CHECK(StrToWStr(Text<char>(src).get(), nullptr, bufsize) == nullptr);
-    }
+  for (const int bufsize : {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, INT_MAX}) {
+    for (const Units& src : {u""s, u"\u00e9\u00ff"s, u"abcdefg"s}) checkWiden(src, bufsize);
+    Buffer<WCHAR> emptied;
+    CHECK(StrToWStr(nullptr, emptied.get(), bufsize) == emptied.get());
+    emptied.check(u"\0"s);
+    CHECK(StrToWStr(Text<char>(u"a").get(), nullptr, bufsize) == nullptr);
   }
 }
 
@@ -140,14 +109,8 @@ TEST_CASE("WStrToStr escapes what is not printable and cuts between units") {
       u"a\u4e2db",  u"\u4e2db", u"&(",     u"\x1f ~\x7f", u"\u0080\u0100\u0fff\u1000\uffff",
       u"abcdefghij"};
   for (const Units& src : sources) {
-    for (int step = -2; step < 50; ++step) {
-      const int bufsize = step < -1 ? INT_MIN : step;
-      CAPTURE(show(src));
-      CAPTURE(bufsize);
-      Buffer<char> des(u"", 64);
-      CHECK(WStrToStr(Text<WCHAR>(src).get(), des.get(), bufsize) == des.get());
-      des.check(model::escape(src, bufsize) + u'\0');
-    }
+    checkEscape(src, INT_MIN);
+    for (int bufsize = -1; bufsize < 50; ++bufsize) checkEscape(src, bufsize);
   }
 }
 

@@ -1,10 +1,4 @@
-#include "model.h"
-#include "support.h"
-
-TWIN(Token)
-TWIN(Split)
-TWIN(Trim)
-TWIN(Replace)
+#include "checks.h"
 
 namespace {
 
@@ -13,51 +7,13 @@ const std::vector<Units> sets = {u"", u",", u",;", u";,;,", u"\u00e9", u"\u00e9a
 
 TEST_SUITE_BEGIN("Tokenizing and splitting");
 
-TEST_CASE_TEMPLATE("StrToken walks from any offset to the end and stays there", Unit, char, WCHAR) {
+TEST_CASE_TEMPLATE("StrToken and StrSplit walk to the end", Unit, char, WCHAR) {
   for (const Units& text : texts) {
     for (const Units& set : sets) {
-      Text<Unit> dlmt(set);
+      checkSplit<Unit>(text, set);
       for (int start = 0; start <= static_cast<int>(text.size()); ++start) {
-        CAPTURE(show(text));
-        CAPTURE(show(set));
-        CAPTURE(start);
-        Buffer<Unit> str(text + u'\0', text.size() + 1);
-        Units cut = text;
-        int off = start;
-        int expectedOff = start;
-        for (int ends = 0; ends < 2;) {
-          const int expected = model::token(cut, expectedOff, set);
-          CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, dlmt.get())) == expected);
-          CHECK(off == expectedOff);
-          if (expected < 0) ++ends;
-        }
-        str.check(cut + u'\0');
+        checkWalk<Unit>(text, set, start);
       }
-    }
-  }
-}
-
-TEST_CASE_TEMPLATE("StrSplit stores all tokens and no entry more", Unit, char, WCHAR) {
-  for (const Units& text : texts) {
-    for (const Units& set : sets) {
-      CAPTURE(show(text));
-      CAPTURE(show(set));
-      Buffer<Unit> str(text + u'\0', text.size() + 1);
-      Units cut = text;
-      std::vector<int> expected;
-      int off = 0;
-      while (!cut.empty()) {
-        expected.push_back(model::token(cut, off, set));
-        if (expected.back() < 0) break;
-      }
-      const size_t count = expected.empty() ? 0 : expected.size() - 1;
-      Unit untouched{};
-      std::vector<Unit*> wrd(count + 1, &untouched);
-      CHECK(twin::Split<Unit>(str.get(), Text<Unit>(set).get(), wrd.data()) ==
-            static_cast<int>(count));
-      for (size_t i = 0; i < count; ++i) CHECK(str.indexOf(wrd[i]) == expected[i]);
-      CHECK(wrd[count] == &untouched);
-      str.check(cut + u'\0');
     }
   }
 }
@@ -92,15 +48,7 @@ TEST_SUITE_BEGIN("Trimming");
 
 TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char, WCHAR) {
   for (const Units& text : texts) {
-    for (const Units& set : sets) {
-      CAPTURE(show(text));
-      CAPTURE(show(set));
-      Buffer<Unit> str(text + u'\0', text.size() + 1);
-      Units expected = text;
-      const int kept = model::trim(expected, set);
-      CHECK(twin::Trim<Unit>(str.get(), Text<Unit>(set).get()) == kept);
-      str.check(expected);
-    }
+    for (const Units& set : sets) checkTrim<Unit>(text, set);
   }
 }
 
@@ -119,22 +67,6 @@ TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {
 
 TEST_SUITE_END();
 TEST_SUITE_BEGIN("Replacing");
-
-template <typename Unit>
-void checkReplace(const Units& text, const Units& pattern, const Units& replacement) {
-  CAPTURE(show(text));
-  CAPTURE(show(pattern));
-  CAPTURE(show(replacement));
-  Text<Unit> orig(text);
-  Text<Unit> rep(pattern);
-  Text<Unit> with(replacement);
-  const Units expected = model::replace(text, pattern, replacement);
-  const int length = static_cast<int>(expected.size());
-  CHECK(twin::Replace<Unit>(orig.get(), rep.get(), with.get(), nullptr) == length);
-  Buffer<Unit> result(u"", expected.size() + 1);
-  CHECK(twin::Replace<Unit>(orig.get(), rep.get(), with.get(), result.get()) == length);
-  result.check(expected + u'\0');
-}
 
 TEST_CASE_TEMPLATE("StrReplace sizes and fills alike", Unit, char, WCHAR) {
   const std::vector<Units> patterns = allTexts(u"ab", 3);

@@ -12,14 +12,18 @@ using Units = std::u16string;
 
 inline constexpr int noLimit = 0x7fffffff;
 
-inline Units lower(Units text) {
-  const Units capitals = u"ABCDEFGHIJKLMNOPQRSTUVWXYZ";
+inline const Units capitals = u"ABCDEFGHIJKLMNOPQRSTUVWXYZ";
+inline const Units smallLetters = u"abcdefghijklmnopqrstuvwxyz";
+
+inline Units exchange(Units text, const Units& letters, const Units& others) {
   for (char16_t& unit : text) {
-    const size_t letter = capitals.find(unit);
-    if (letter != Units::npos) unit = u"abcdefghijklmnopqrstuvwxyz"[letter];
+    const size_t letter = letters.find(unit);
+    if (letter != Units::npos) unit = others[letter];
   }
   return text;
 }
+inline Units lower(const Units& text) { return exchange(text, capitals, smallLetters); }
+inline Units upper(const Units& text) { return exchange(text, smallLetters, capitals); }
 
 inline Units take(const Units& text, int count) {
   return text.substr(0, static_cast<size_t>(std::max(count, 0)));
