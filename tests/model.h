@@ -15,10 +15,10 @@ inline constexpr int noLimit = 0x7fffffff;
 inline const Units capitals = u"ABCDEFGHIJKLMNOPQRSTUVWXYZ";
 inline const Units smallLetters = u"abcdefghijklmnopqrstuvwxyz";
 
-inline Units exchange(Units text, const Units& letters, const Units& others) {
+inline Units exchange(Units text, const Units& from, const Units& to) {
   for (char16_t& unit : text) {
-    const size_t letter = letters.find(unit);
-    if (letter != Units::npos) unit = others[letter];
+    const size_t letter = from.find(unit);
+    if (letter != Units::npos) unit = to[letter];
   }
   return text;
 }
