@@ -269,9 +269,6 @@ template <typename Case, typename Unit, typename Bound>
   return difference == 0 ? 0 : difference < 0 ? -position : position;
 }
 
-// StrNICmp alone reports every difference as negative. Its callers rely on it.
-int alwaysNegative(int result) { return result > 0 ? -result : result; }
-
 }  // namespace
 
 int StrNCmp(const char* str1, const char* str2, int n) {
@@ -281,9 +278,10 @@ int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) {
   return compare<Exact>(str1, str2, Count{n});
 }
 
+// Irregular by contract: every difference is negative, only the null rule gives a positive result.
 int StrNICmp(const char* str1, const char* str2, int n) {
   const int result = compare<IgnoreCase>(str1, str2, Count{n});
-  return str1 && str2 ? alwaysNegative(result) : result;
+  return str1 && str2 && result > 0 ? -result : result;
 }
 int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) {
   return compare<IgnoreCase>(str1, str2, Count{n});
