@@ -34,7 +34,7 @@ NAMED_TWIN(FromInt, IntToStr, IntToWStr)
 
 template <typename Unit>
 void checkLengthAndCase(const Units& text) {
-  CAPTURE(show(text));
+  INFO(show(text));
   CHECK(twin::Len<Unit>(Text<Unit>(text).get()) == static_cast<int>(text.size()));
   Buffer<Unit> raised(text + u'\0', text.size() + 1);
   CHECK(twin::Upper<Unit>(raised.get()) == raised.get());
@@ -48,8 +48,7 @@ void checkLengthAndCase(const Units& text) {
 
 template <typename Unit>
 void checkCopies(const Units& src, int n) {
-  CAPTURE(show(src));
-  CAPTURE(n);
+  INFO(show(src), ", ", n);
   Buffer<Unit> whole(u"", src.size() + 1);
   twin::Copy<Unit>(whole.get(), Text<Unit>(src).get());
   whole.check(src + u'\0');
@@ -67,10 +66,7 @@ void checkCopies(const Units& src, int n) {
 
 template <typename Unit>
 void checkAppends(const Units& dst, const Units& src, int n, int num) {
-  CAPTURE(show(dst));
-  CAPTURE(show(src));
-  CAPTURE(n);
-  CAPTURE(num);
+  INFO(show(dst), ", ", show(src), ", ", n, ", ", num);
   const size_t size = dst.size() + src.size() + 2;
   Buffer<Unit> whole(dst + u'\0', size);
   twin::Cat<Unit>(whole.get(), Text<Unit>(src).get());
@@ -93,8 +89,7 @@ void checkAppends(const Units& dst, const Units& src, int n, int num) {
 
 template <typename Unit>
 void checkFindUnit(const Units& text, char16_t c) {
-  CAPTURE(show(text));
-  CAPTURE(c);
+  INFO(show(text), ", ", c);
   Text<Unit> str(text);
   const size_t index = c == 0 ? Units::npos : text.find(c);
   Unit* const expected = index == Units::npos ? nullptr : str.get() + index;
@@ -137,9 +132,7 @@ void checkCompare(const Units& one, const Units& two, int n) {
 
 template <typename Unit>
 void checkWalk(const Units& text, const Units& set, int start) {
-  CAPTURE(show(text));
-  CAPTURE(show(set));
-  CAPTURE(start);
+  INFO(show(text), ", ", show(set), ", ", start);
   Text<Unit> dlmt(set);
   Buffer<Unit> str(text + u'\0', text.size() + 1);
   Units cut = text;
@@ -156,8 +149,7 @@ void checkWalk(const Units& text, const Units& set, int start) {
 
 template <typename Unit>
 void checkSplit(const Units& text, const Units& set) {
-  CAPTURE(show(text));
-  CAPTURE(show(set));
+  INFO(show(text), ", ", show(set));
   Units cut = text;
   std::vector<int> expected;
   int off = 0;
@@ -176,8 +168,7 @@ void checkSplit(const Units& text, const Units& set) {
 
 template <typename Unit>
 void checkTrim(const Units& text, const Units& set) {
-  CAPTURE(show(text));
-  CAPTURE(show(set));
+  INFO(show(text), ", ", show(set));
   Buffer<Unit> str(text + u'\0', text.size() + 1);
   Units expected = text;
   const int kept = model::trim(expected, set);
@@ -187,9 +178,7 @@ void checkTrim(const Units& text, const Units& set) {
 
 template <typename Unit>
 void checkReplace(const Units& text, const Units& pattern, const Units& replacement) {
-  CAPTURE(show(text));
-  CAPTURE(show(pattern));
-  CAPTURE(show(replacement));
+  INFO(show(text), ", ", show(pattern), ", ", show(replacement));
   Text<Unit> orig(text);
   Text<Unit> rep(pattern);
   Text<Unit> with(replacement);
@@ -205,8 +194,7 @@ void checkReplace(const Units& text, const Units& pattern, const Units& replacem
 
 template <typename Unit>
 void checkFromInt(int value, int radix) {
-  CAPTURE(value);
-  CAPTURE(radix);
+  INFO(value, ", ", radix);
   Buffer<Unit> string(u"", 34);
   CHECK(twin::FromInt<Unit>(value, string.get(), radix) == string.get());
   string.check(model::intToText(value, radix) + u'\0');
@@ -219,8 +207,7 @@ void checkToInt(const Units& text) {
 
 // The arrays start some units into their memory, to be aligned or not.
 inline void checkWords(const Units& units, int len, int from, int to) {
-  CAPTURE(show(units));
-  CAPTURE(len);
+  INFO(show(units), ", ", len);
   const Units written = model::take(units, len);
   const Units src = Units(static_cast<size_t>(from), u'-') + model::take(units, std::max(len, 1));
   auto bytes = exact<char>(src);
@@ -235,16 +222,14 @@ inline void checkWords(const Units& units, int len, int from, int to) {
 }
 
 inline void checkWiden(const Units& src, int bufsize) {
-  CAPTURE(show(src));
-  CAPTURE(bufsize);
+  INFO(show(src), ", ", bufsize);
   Buffer<WCHAR> des(u"", src.size() + 2);
   CHECK(StrToWStr(Text<char>(src).get(), des.get(), bufsize) == des.get());
   des.check(model::copyBuf(std::max(bufsize, 1), src));
 }
 
 inline void checkEscape(const Units& src, int bufsize) {
-  CAPTURE(show(src));
-  CAPTURE(bufsize);
+  INFO(show(src), ", ", bufsize);
   Buffer<char> des(u"", 9 * src.size() + 1);
   CHECK(WStrToStr(Text<WCHAR>(src).get(), des.get(), bufsize) == des.get());
   des.check(model::escape(src, bufsize) + u'\0');

@@ -46,9 +46,8 @@ TEST_CASE_TEMPLATE("StrToInt reads spaces, a sign and digits", Unit, char, WCHAR
 }
 
 TEST_CASE("WStrToInt reads no digit, sign or space beyond ASCII") {
-  CHECK(WStrToInt(Text<WCHAR>(u" 1\u01323").get()) == 1);
-  for (const char16_t* const text : {u"\uff15", u"\u01205", u"\u012d5", u"\u30005"}) {
-    CHECK(WStrToInt(Text<WCHAR>(text).get()) == 0);
+  for (const Units& text : {u" 1\u01323"s, u"\uff15"s, u"\u01205"s, u"\u012d5"s, u"\u30005"s}) {
+    checkToInt<WCHAR>(text);
   }
 }
 

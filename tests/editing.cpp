@@ -52,12 +52,6 @@ TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char
   }
 }
 
-TEST_CASE_TEMPLATE("StrTrim leaves the units behind the new terminator", Unit, char, WCHAR) {
-  Buffer<Unit> str(u"--ab-.\0"s);
-  CHECK(twin::Trim<Unit>(str.get(), Text<Unit>(u"-.").get()) == 2);
-  str.check(u"ab\0b\0.\0"s);
-}
-
 TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {
   Buffer<Unit> str(u" a \0"s);
   CHECK(twin::Trim<Unit>(str.get(), nullptr) == 3);

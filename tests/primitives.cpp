@@ -18,10 +18,6 @@ TEST_CASE_TEMPLATE("StrLen, StrUpper and StrLower walk the whole text", Unit, ch
   }
 }
 
-TEST_CASE("WStrLen counts units whose low byte is 0") {
-  CHECK(WStrLen(Text<WCHAR>(u"\u0100\u4e00\uff00").get()) == 3);
-}
-
 TEST_CASE("CharToLower and CharToUpper map the 26 letters and nothing else") {
   for (int c = -70000; c <= 70000; ++c) {
     const int lower = c >= 'A' && c <= 'Z' ? c + 32 : c;
@@ -43,11 +39,8 @@ TEST_CASE_TEMPLATE("StrUpper, StrLower and StrCatBuf write only what changes", U
   twin::CatBuf<Unit>(const_cast<Unit*>(small), 6, capitals);
 }
 
-TEST_CASE("WStrUpper and WStrLower know no letters beyond ASCII") {
-  const Units text = u"\u00e9\uff41\u0161\u0261\u00c9\uff21\u0141\u0241"s + u'\0';
-  Buffer<WCHAR> buffer(text);
-  WStrLower(WStrUpper(buffer.get()));
-  buffer.check(text);
+TEST_CASE("WStrLen, WStrUpper and WStrLower take all 16 bits") {
+  checkLengthAndCase<WCHAR>(u"\u0100\u4e00\uff00\u00e9\uff41\u0161\u0261\u00c9\uff21\u0141\u0241");
 }
 
 TEST_SUITE_END();
@@ -150,14 +143,12 @@ TEST_CASE_TEMPLATE("StrChr finds the first such unit but never the terminator", 
 }
 
 TEST_CASE("Wide searches and comparisons compare all 16 bits") {
-  Text<WCHAR> text(u"\u0141A\u8000");
-  CHECK(WStrChr(text.get(), 'A') == text.get() + 1);
-  CHECK(WStrChr(text.get(), 0x8000) == text.get() + 2);
-  CHECK(WStrStr(text.get(), Text<WCHAR>(u"A").get()) == text.get() + 1);
-  CHECK(WStrIStr(text.get(), Text<WCHAR>(u"a").get()) == text.get() + 1);
-  CHECK(WStrIStr(text.get(), Text<WCHAR>(u"\u0161").get()) == nullptr);
-  CHECK(WStrCmp(text.get() + 2, text.get() + 1) == 1);
-  CHECK(WStrICmp(text.get(), Text<WCHAR>(u"\u0161").get()) == -1);
+  const Units text = u"\u0141A\u8000";
+  for (const char16_t unit : u"A\u0141\u0161a\u8000\u0041\u4141"s) {
+    checkFindUnit<WCHAR>(text, unit);
+    checkFind<WCHAR>(text, Units(1, unit));
+    checkCompare<WCHAR>(text, Units(1, unit), 5);
+  }
 }
 
 TEST_CASE_TEMPLATE("StrStr and StrIStr answer null and empty texts in this order", Unit, char,
@@ -182,11 +173,9 @@ TEST_CASE_TEMPLATE("StrStr and StrIStr find the first place", Unit, char, WCHAR)
 }
 
 TEST_CASE_TEMPLATE("StrStr and StrIStr go on after a long partial match", Unit, char, WCHAR) {
-  Text<Unit> text(u"@[ababac-abababacus");
-  CHECK(twin::Str<Unit>(text.get(), Text<Unit>(u"ababacu").get()) == text.get() + 11);
-  CHECK(twin::IStr<Unit>(text.get(), Text<Unit>(u"ABABACU").get()) == text.get() + 11);
-  CHECK(twin::IStr<Unit>(text.get(), Text<Unit>(u"`").get()) == nullptr);
-  CHECK(twin::IStr<Unit>(text.get(), Text<Unit>(u"{").get()) == nullptr);
+  for (const Units& substr : {u"ababacu"s, u"ABABACU"s, u"`"s, u"{"s}) {
+    checkFind<Unit>(u"@[ababac-abababacus", substr);
+  }
 }
 
 TEST_SUITE_END();
