@@ -156,10 +156,6 @@ void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) { nCopy(dst, src, n); }
 
 namespace {
 
-// Pairs such as this one let a template call the twin of its own width.
-int len(const char* str) { return StrLen(str); }
-int len(const WCHAR* str) { return WStrLen(str); }
-
 template <typename Unit>
 [[gnu::always_inline]] inline void cat(Unit* dst, const Unit* src) {
   if (!dst || !src) return;
@@ -350,14 +346,19 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dl
 
 namespace {
 
+// Pairs such as these let a template call the twin of its own width.
+int len(const char* str) { return StrLen(str); }
+int len(const WCHAR* str) { return WStrLen(str); }
+
 void copyText(char* dst, const char* src) { StrCopy(dst, src); }
 void copyText(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
 
 template <typename Unit>
 [[gnu::always_inline]] inline int trim(Unit* str, const Unit* trimSet) {
   if (!str) return 0;
+  const Unit emptySet = 0;
+  if (!trimSet) trimSet = &emptySet;
   Unit* first = str;
-  if (!trimSet) trimSet = str + len(str);  // an empty set
   while (contains(trimSet, *first)) ++first;
   Unit* end = first + len(first);
   while (end > first + 1 && contains(trimSet, end[-1])) --end;

@@ -2,7 +2,6 @@
 // destinations between canaries.
 #pragma once
 
-#include <algorithm>
 #include <string>
 #include <type_traits>
 #include <vector>
