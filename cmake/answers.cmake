@@ -4,7 +4,8 @@ function(answers_test target input answers)
   if(CMAKE_CROSSCOMPILING)
     microbit_firmware(${target})
   endif()
-  set(run "$<JOIN:$<TARGET_PROPERTY:${target},CROSSCOMPILING_EMULATOR>, > $<TARGET_FILE:${target}>")
-  add_test(NAME ${target} COMMAND sh -c "${run} <${input} | diff ${answers} -")
+  add_test(NAME ${target} COMMAND ${PROJECT_SOURCE_DIR}/tests/answers ${input} ${answers}
+    $<TARGET_PROPERTY:${target},CROSSCOMPILING_EMULATOR> $<TARGET_FILE:${target}>
+    COMMAND_EXPAND_LISTS)
   set_tests_properties(${target} PROPERTIES TIMEOUT 60)
 endfunction()
