@@ -118,9 +118,8 @@ std::vector<Row> rowsFor(uint32_t unit) {
   };
 #define TWIN(name) wide ? "W" #name : #name, wide ? SYMBOL(W##name) : SYMBOL(name)
 
-  add(TWIN(StrLen), "", "strlen", [=](int n) {
-    return Call{{text(prose(n))}, {b0}, Result::number, n};
-  });
+  add(TWIN(StrLen), "", "strlen",
+      [=](int n) { return Call{{text(prose(n))}, {b0}, Result::number, n}; });
   add(TWIN(StrUpper), "", "strupr", [=](int n) {
     return Call{{text(prose(n))}, {b0}, Result::index, 0, 0, mapped(prose(n), upper)};
   });
@@ -153,21 +152,17 @@ std::vector<Row> rowsFor(uint32_t unit) {
                 std::move(peer)};
   };
   add(TWIN(StrCat), "", "strcat", [=](int n) { return append(n, {b0, b1}); });
-  add(TWIN(StrCatBuf), "", "strlcat", [=](int n) {
-    return append(n, {b0, number(n + 1), b1}, {b0, b1, number(n + 1)});
-  });
+  add(TWIN(StrCatBuf), "", "strlcat",
+      [=](int n) { return append(n, {b0, number(n + 1), b1}, {b0, b1, number(n + 1)}); });
   if (wide) {
-    add("WStrNCat", SYMBOL(WStrNCat), "", "", [=](int n) {
-      return append(n, {b0, b1, number(n)});
-    });
-    add("WStrNCatBuf", SYMBOL(WStrNCatBuf), "", "", [=](int n) {
-      return append(n, {b0, number(n + 1), b1, number(n)});
-    });
+    add("WStrNCat", SYMBOL(WStrNCat), "", "",
+        [=](int n) { return append(n, {b0, b1, number(n)}); });
+    add("WStrNCatBuf", SYMBOL(WStrNCatBuf), "", "",
+        [=](int n) { return append(n, {b0, number(n + 1), b1, number(n)}); });
   }
 
-  add(TWIN(StrChr), ", not found", "strchr", [=](int n) {
-    return Call{{text(prose(n))}, {b0, number('~')}, Result::index, -1};
-  });
+  add(TWIN(StrChr), ", not found", "strchr",
+      [=](int n) { return Call{{text(prose(n))}, {b0, number('~')}, Result::index, -1}; });
   const auto find = [=](int n, const Units& word) {
     const Units before = prose(std::max(n - 4, 0));
     return Call{{text(n < 4 ? u"" : before + u"dawn"), text(word)},
@@ -240,10 +235,7 @@ std::vector<Row> rowsFor(uint32_t unit) {
       },
       {1, 4, 10});
   add(TWIN(StrToInt), "", "atoi",
-      [=](int n) {
-        return Call{{text(digits(n))}, {b0}, Result::number, value(n)};
-      },
-      {1, 4, 10});
+      [=](int n) { return Call{{text(digits(n))}, {b0}, Result::number, value(n)}; }, {1, 4, 10});
 
   if (wide) {
     const auto copyWords = [=](int n, uint32_t from) {
@@ -275,15 +267,9 @@ std::vector<Row> rowsFor(uint32_t unit) {
     add("WStrToWords", SYMBOL(WStrToWords), "", "", [=](int n) { return copyWords(n, 2); });
   } else {
     add("CharToLower", SYMBOL(CharToLower), "", "",
-        [](int) {
-          return Call{{}, {number('A')}, Result::number, 'a'};
-        },
-        {1});
+        [](int) { return Call{{}, {number('A')}, Result::number, 'a'}; }, {1});
     add("CharToUpper", SYMBOL(CharToUpper), "", "",
-        [](int) {
-          return Call{{}, {number('a')}, Result::number, 'A'};
-        },
-        {1});
+        [](int) { return Call{{}, {number('a')}, Result::number, 'A'}; }, {1});
   }
   return rows;
 }
