@@ -21,11 +21,19 @@
  * - letter: "A" to "Z" and "a" to "z" of ASCII, in both widths. No other unit has a case.
  *
  * Counts and capacities are signed, so a miscalculated negative one is as harmless as 0. What a
- * function cannot see is the caller's to get right: that a buffer is large enough, and that an
- * output does not overlap an input except where a contract allows it.
+ * function cannot see is the caller's to get right: that a buffer is large enough, that an output
+ * does not overlap an input except where a contract allows it, and that a `WCHAR*` or `WORD*` is
+ * even, as every array of these types is: a Cortex-M0+ faults at an odd one.
  *
- * A function whose name starts with W is the wide twin of the one without and has the same
- * contract, with 16-bit units for 8-bit ones.
+ * A wide twin is declared after its narrow function and has the same contract, with 16-bit units
+ * for 8-bit ones. Functions without such a twin state a contract of their own: WStrNCat(),
+ * WStrNCatBuf(), WStrNICmp(), and those that convert between the widths.
+ *
+ * A wide text is written u"..." in C11, where its type is that of WCHAR. In C++ it is of another
+ * type: write `const WCHAR text[] = {'H', 'i', 0}`, or widen a narrow text with StrToWStr().
+ *
+ * Threads and interrupt handlers may call any function at any time, also the one that was
+ * interrupted, as long as none writes a buffer that another uses.
  *
  * Beware: SubName.h turns each API name into a macro for its numbered link symbol. It rewrites
  * that identifier everywhere after the include, class members too.
@@ -76,8 +84,9 @@ WCHAR* WStrLower(WCHAR* str);
 /**
  * @name Copying
  * All copies run forward, so `dst` may overlap `src` if it begins before it; a `dst` that begins
- * inside `src` is not supported. If `dst` is null or the same pointer as `src`, nothing is
- * written. A null `src` empties `dst`.
+ * inside `src` is not supported. The rules are tried in this order: if `dst` is null or the same
+ * pointer as `src`, nothing is written; nor by StrCopyBuf() if `n` is below 1; a null `src`
+ * empties `dst`; so does StrNCopy() if `n` is below 1.
  */
 /**@{*/
 
@@ -88,8 +97,8 @@ void WStrCopy(WCHAR* dst, const WCHAR* src);
 
 /**
  * Copies as much of `src` as fits into the capacity `n` of `dst`: at most `n` - 1 units, then the
- * terminator; the units after it are left as they were. With `n` below 1 nothing is written. A cut
- * is not reported: compare the lengths where it matters.
+ * terminator; the units after it are left as they were. With `n` below 1 nothing is written, not
+ * even for a null `src`. A cut is not reported: compare the lengths where it matters.
  */
 void StrCopyBuf(char* dst, int n, const char* src);
 /** Wide twin of StrCopyBuf(). */
@@ -130,11 +139,13 @@ void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src);
 
 /**
  * Appends at most `num` units of `src` and reads no more than these; with `num` below 1 the text
- * stays as it is. Wide only.
+ * stays as it is. `dst` has room for its text, the units appended and the terminator. Wide only.
  */
 void WStrNCat(WCHAR* dst, const WCHAR* src, int num);
 
-/** Appends at most `num` units of `src`, and no more than WStrCatBuf() with `n` would. Wide only.
+/**
+ * Appends at most `num` units of `src`, and no more than WStrCatBuf() with `n` would; with `num`
+ * below 1 the text stays as it is. Wide only.
  */
 void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num);
 
@@ -216,8 +227,9 @@ int WStrICmp(const WCHAR* str1, const WCHAR* str2);
 /**
  * Returns the next token of `str` that begins at or after the index `*off`, or null when only
  * delimiters remain. Set `*off` to 0 before the first call. Each call leaves it after the
- * delimiter that it overwrote, or at the index of the terminator, where every further call returns
- * null again. It must lie within the uncut text: an index outside is not detected. If an argument
+ * delimiter that it overwrote, or at the index of the terminator, from where every call returns
+ * null. Delimiters before a token are skipped, so no token stands for an empty field between two
+ * of them. `*off` must lie within the uncut text: an index outside is not detected. If an argument
  * is null, the result is null and `*off` stays.
  *
  * A walk's state is `*off` alone, so walks over different texts may alternate, and each call may
@@ -263,8 +275,8 @@ int WStrTrim(WCHAR* str, const WCHAR* trimSet);
  *
  * With a null `result` nothing is written and the length that the new text will have is returned:
  * call once to size the buffer, provide that many units + 1, and call again to fill it. A smaller
- * buffer is not detected. `result` must not overlap the other texts, except that it may be `orig`
- * itself if `rep` does not occur in it.
+ * buffer is not detected, nor a length that an int cannot hold. `result` must not overlap the other
+ * texts, except that it may be `orig` itself if `rep` does not occur in it.
  *
  * If `orig`, `rep` or `with` is null or `rep` is empty, the result is 0 and nothing is written, not
  * even a terminator.
@@ -281,12 +293,12 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* r
 /**
  * Writes the text of `value` in `radix` to `string` and returns `string`; null if it is null. The
  * text is a "-" if the value is negative, then its digits without leading zeros: "0" to "9", then
- * "a" to "z", then the units that follow "z" for digits above 35. It takes, with its terminator,
- * at most 34 units in radix 2, 13 in radix 8, 12 in radix 10, 10 in radix 16 and 8 in radix 36;
- * nothing after it is written.
+ * "a" to "z", then the units that follow "z" for digits above 35, of which 8 or 16 bits are kept.
+ * It takes, with its terminator, at most 34 units in radix 2 and in any other, 13 in radix 8, 12 in
+ * radix 10, 10 in radix 16 and 8 in radix 36; nothing after it is written.
  *
- * Every value is written so, the most negative one included. A radix below 1 gives the empty text,
- * and so does radix 1, which has no text for them, with any value but 0.
+ * Every value is written so, the most negative one included. A radix below 1 gives the empty text.
+ * Radix 1 writes 0 as "0" and gives the empty text for every other value.
  */
 char* IntToStr(int value, char* string, int radix);
 /** Wide twin of IntToStr(). */
@@ -325,9 +337,9 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize);
 /**
  * Writes `src` as printable text to `des`, within its capacity `bufsize`, and returns `des`. The
  * units 32 to 126 are written as they are, every other one as an escape: "&(0x", its value in
- * hexadecimal without leading zeros, ")". An "&" is not escaped itself, so the text cannot be
- * read back for certain. It ends before the first unit or escape that does not fit whole with the
- * terminator; a cut is not reported.
+ * hexadecimal without leading zeros, ")". 9 x the length of `src` + 1 units hold every such text.
+ * An "&" is not escaped itself, so the text cannot be read back for certain. It ends before the
+ * first unit or escape that does not fit whole with the terminator; a cut is not reported.
  *
  * A null `src` empties `des`. A `bufsize` below 1 is taken as 1: `des` must have room for one unit
  * in any case. A null `des` gives a constant empty text, which must not be written to.

@@ -3,17 +3,70 @@
 // symbol of its own in the object.
 #include "strutil.h"
 
-static_assert(static_cast<char>(-1) > 0, "narrow units are 0 to 255: compile with -funsigned-char");
+#include <limits.h>
+
+// The target's division is a routine of the compiler's runtime that gives the quotient and the
+// remainder at once. Called by name: unoptimised builds, and Clang, would call one for each.
+#if defined(__ARM_EABI__) && !defined(__ARM_FEATURE_IDIV) && !defined(__ARM_BIG_ENDIAN)
+#define STRUTIL_IDIVMOD __aeabi_idivmod
+extern "C" uint64_t STRUTIL_IDIVMOD(int dividend, int divisor) noexcept;
+#endif
+
+// What is particular to compilers. The module is right without any of it. It keeps calls that the
+// compilers invent out of the object, whatever the user's options, and it says what options cannot
+// be asked of every user: how loops over units come out fast on a Cortex-M0+.
+#if defined(__clang__)
+// Clang without minsize repeats every small loop four times, and inlines each function called.
+#pragma clang attribute push
+#pragma clang attribute(__attribute__((no_builtin)), apply_to = function)
+#pragma clang attribute(__attribute__((no_stack_protector)), apply_to = function)
+#pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))
+#pragma clang attribute(__attribute__((minsize)), apply_to = function)
+#elif defined(__GNUC__)
+// GCC's -ftree-pre, -fivopts, -ftree-scev-cprop and -fpartial-inlining keep more values than the
+// core has low registers, work out after a loop what the loop knew, or put a call before it.
+#pragma GCC push_options
+#pragma GCC optimize("no-tree-loop-distribute-patterns", "no-tree-vectorize", "no-stack-protector")
+#pragma GCC optimize("no-tree-pre", "no-ivopts", "no-tree-scev-cprop", "no-partial-inlining")
+#endif
+
+#if defined(__clang__)
+#define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // minsize inlines no lambda
+#elif defined(__GNUC__)
+#define STRUTIL_INLINE [[gnu::always_inline]] inline
+#else
+#define STRUTIL_INLINE inline
+#endif
+
+#if defined(__clang__) || defined(__GNUC__)
+#define STRUTIL_RARELY(condition) __builtin_expect(!!(condition), 0)
+#define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides where the value comes from
+#define STRUTIL_ALIASING [[gnu::may_alias]]
+#else
+#define STRUTIL_RARELY(condition) (condition)
+#define STRUTIL_OPAQUE(value)
+#endif
 
 namespace {
 
+// Narrow text is read and written as bytes, so that nothing depends on the sign of a plain char.
+using Byte = uint8_t;
+
+Byte* units(char* str) { return reinterpret_cast<Byte*>(str); }
+const Byte* units(const char* str) { return reinterpret_cast<const Byte*>(str); }
+WCHAR* units(WCHAR* str) { return str; }
+const WCHAR* units(const WCHAR* str) { return str; }
+
+char* text(const Byte* str) { return reinterpret_cast<char*>(const_cast<Byte*>(str)); }
+WCHAR* text(const WCHAR* str) { return const_cast<WCHAR*>(str); }
+
 // Bounds of a walk: how many more units it may take.
 struct Count {
-  int left;
+  int left = INT_MAX;
 
-  bool take(int units) {
-    if (left < units) return false;
-    left -= units;
+  bool take(int count) {
+    if (left < count) return false;
+    left -= count;
     return true;
   }
 };
@@ -22,29 +75,55 @@ struct Endless {
   static bool take(int) { return true; }
 };
 
-// Tells the compiler which way a walk mostly goes: a branch not taken is the cheaper one.
-constexpr bool rarely(bool condition) { return __builtin_expect(condition, false); }
+// A small build shares what a fast one repeats: a function that serves several of the library's,
+// rather than a copy in each; a loop with a bound also for those without; one step a turn.
+#if defined(__OPTIMIZE_SIZE__)
+#define STRUTIL_CORE inline
+using Whole = Count;
+enum { stepsATurn = 1 };
+#else
+#define STRUTIL_CORE STRUTIL_INLINE
+using Whole = Endless;
+enum { stepsATurn = 4 };
+#endif
 
-// The loop that all others are expressed through: passes the units that the pointers point at to
-// `stop`, one of each, and moves all pointers on by one unit, until `stop` returns true or the
-// bound is reached. The pointers are left at the units that stopped it, or after the last ones.
-// Returns whether it was stopped. Four steps a turn: the arithmetic and the jump back, and the test
-// of the bound, cost half as much as the rest of a simple step.
-template <typename Bound, typename Stop, typename... Unit>
-[[gnu::always_inline]] inline bool walk(Bound bound, Stop stop, Unit*&... at) {
-  for (; bound.take(4); (..., (at += 4))) {
-    if (rarely(stop(at[0]...))) return true;
-    if (rarely(stop(at[1]...))) return (..., (at += 1)), true;
-    if (rarely(stop(at[2]...))) return (..., (at += 2)), true;
-    if (rarely(stop(at[3]...))) return (..., (at += 3)), true;
+// As an integer: of a pointer that moves, Clang makes several, each with an offset of its own.
+template <typename Unit>
+void advance(Unit*& at, uintptr_t count) {
+  at = reinterpret_cast<Unit*>(reinterpret_cast<uintptr_t>(at) + count * sizeof(Unit));
+}
+
+// The loop of all walks. Four steps a turn: the arithmetic and the jump back, and the test of the
+// bound, cost half as much as the rest of a simple step.
+template <typename Bound, typename GoesOn, typename... Unit>
+STRUTIL_INLINE bool steps(Bound bound, const GoesOn& goesOn, Unit*&... at) {
+  if constexpr (stepsATurn == 4) {
+    for (; bound.take(4); (..., advance(at, 4))) {
+      if (STRUTIL_RARELY(!goesOn(at[0]...))) return true;
+      if (STRUTIL_RARELY(!goesOn(at[1]...))) return (..., advance(at, 1)), true;
+      if (STRUTIL_RARELY(!goesOn(at[2]...))) return (..., advance(at, 2)), true;
+      if (STRUTIL_RARELY(!goesOn(at[3]...))) return (..., advance(at, 3)), true;
+    }
   }
-  for (; bound.take(1); (..., ++at)) {
-    if (stop(*at...)) return true;
+  for (; bound.take(1); (..., advance(at, 1))) {
+    if (!goesOn(*at...)) return true;
   }
   return false;
 }
 
-constexpr int noLimit = 0x7fffffff;
+// What all loops over text are expressed through: passes the units that the pointers point at to
+// `goesOn`, one of each, and moves all pointers on by one unit, until `goesOn` returns false or the
+// bound is reached. The pointers are left at the units that ended it, or after the last ones.
+// Returns whether a unit ended it, not the bound.
+template <typename Bound, typename Unit, typename GoesOn>
+STRUTIL_INLINE bool walk(Bound bound, Unit*& at, const GoesOn& goesOn) {
+  return steps(bound, goesOn, at);
+}
+
+template <typename Bound, typename To, typename From, typename GoesOn>
+STRUTIL_INLINE bool walk(Bound bound, To*& to, From*& from, const GoesOn& goesOn) {
+  return steps(bound, goesOn, to, from);
+}
 
 }  // namespace
 
@@ -53,57 +132,51 @@ constexpr int noLimit = 0x7fffffff;
 namespace {
 
 // What separates the two cases of a letter.
-constexpr int caseBit = 'a' - 'A';
+enum { caseBit = 'a' - 'A' };
 
 // Whether c is one of the 26 letters from `first` on.
-template <unsigned first>
-bool isLetterFrom(unsigned c) {
-  return c - first < 26;
-}
+bool isLetterFrom(unsigned first, unsigned c) { return c - first < 26; }
 
 template <typename Unit>
-[[gnu::always_inline]] inline int length(const Unit* str) {
+STRUTIL_CORE int length(const Unit* str) {
   if (!str) return 0;
   const Unit* end = str;
-  walk(
-      Endless{}, [](unsigned unit) { return unit == 0; }, end);
+  walk(Endless{}, end, [](unsigned unit) { return unit != 0; });
   return static_cast<int>(end - str);
 }
 
-// Gives the letters from `first` on their other case.
-template <unsigned first, typename Unit>
-[[gnu::always_inline]] inline Unit* switchCase(Unit* str) {
+// Adds `change` to the letters from `first` on. Two tests against constants, of which most units
+// need one, rather than one of a range, which needs a copy of the unit.
+template <typename Unit>
+STRUTIL_CORE Unit* switchCase(Unit* str, unsigned first, int change) {
   if (!str) return nullptr;
   Unit* at = str;
-  walk(
-      Endless{},
-      [](Unit& unit) {
-        if (!isLetterFrom<first>(unit)) return unit == 0;
-        unit = static_cast<Unit>(unit ^ caseBit);
-        return false;
-      },
-      at);
+  walk(Endless{}, at, [=](Unit& unit) {
+    if (unit < first) return unit != 0;
+    if (unit < first + 26) unit = static_cast<Unit>(unit + change);
+    return true;
+  });
   return str;
 }
 
 }  // namespace
 
-int StrLen(const char* str) { return length(str); }
-int WStrLen(const WCHAR* str) { return length(str); }
+int StrLen(const char* str) { return length(units(str)); }
+int WStrLen(const WCHAR* str) { return length(units(str)); }
 
 int CharToLower(const int c) {
-  return isLetterFrom<'A'>(static_cast<unsigned>(c)) ? c + caseBit : c;
+  return isLetterFrom('A', static_cast<unsigned>(c)) ? c + caseBit : c;
 }
 
 int CharToUpper(const int c) {
-  return isLetterFrom<'a'>(static_cast<unsigned>(c)) ? c - caseBit : c;
+  return isLetterFrom('a', static_cast<unsigned>(c)) ? c - caseBit : c;
 }
 
-char* StrUpper(char* str) { return switchCase<'a'>(str); }
-WCHAR* WStrUpper(WCHAR* str) { return switchCase<'a'>(str); }
+char* StrUpper(char* str) { return text(switchCase(units(str), 'a', -caseBit)); }
+WCHAR* WStrUpper(WCHAR* str) { return switchCase(str, 'a', -caseBit); }
 
-char* StrLower(char* str) { return switchCase<'A'>(str); }
-WCHAR* WStrLower(WCHAR* str) { return switchCase<'A'>(str); }
+char* StrLower(char* str) { return text(switchCase(units(str), 'A', caseBit)); }
+WCHAR* WStrLower(WCHAR* str) { return switchCase(str, 'A', caseBit); }
 
 // Copying
 
@@ -111,45 +184,44 @@ namespace {
 
 // Copies up to the terminator, or up to the bound without one, and returns where it ended.
 template <typename To, typename From, typename Bound>
-[[gnu::always_inline]] inline To* copyUnits(To* dst, const From* src, Bound bound) {
-  walk(
-      bound, [](To& to, From from) { return (to = from) == 0; }, dst, src);
+STRUTIL_CORE To* copyUnits(To* dst, const From* src, Bound bound) {
+  walk(bound, dst, src, [](To& to, unsigned from) {
+    to = static_cast<To>(from);
+    return from != 0;
+  });
   return dst;
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline void copy(Unit* dst, const Unit* src) {
+STRUTIL_CORE void copy(Unit* dst, const Unit* src) {
   if (!dst || dst == src) return;
   *dst = 0;
-  if (!src) return;
-  copyUnits(dst, src, Endless{});
+  if (src) copyUnits(dst, src, Endless{});
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline void copyBuf(Unit* dst, int n, const Unit* src) {
+void copyBuf(Unit* dst, int n, const Unit* src) {
   if (!dst || dst == src || n < 1) return;
   *dst = 0;
-  if (!src) return;
-  *copyUnits(dst, src, Count{n - 1}) = 0;
+  if (src) *copyUnits(dst, src, Count{n - 1}) = 0;
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline void nCopy(Unit* dst, const Unit* src, int n) {
+void nCopy(Unit* dst, const Unit* src, int n) {
   if (!dst || dst == src) return;
   *dst = 0;
-  if (!src) return;
-  copyUnits(dst, src, Count{n});
+  if (src) copyUnits(dst, src, Count{n});
 }
 
 }  // namespace
 
-void StrCopy(char* dst, const char* src) { copy(dst, src); }
+void StrCopy(char* dst, const char* src) { copy(units(dst), units(src)); }
 void WStrCopy(WCHAR* dst, const WCHAR* src) { copy(dst, src); }
 
-void StrCopyBuf(char* dst, int n, const char* src) { copyBuf(dst, n, src); }
+void StrCopyBuf(char* dst, int n, const char* src) { copyBuf(units(dst), n, units(src)); }
 void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) { copyBuf(dst, n, src); }
 
-void StrNCopy(char* dst, const char* src, int n) { nCopy(dst, src, n); }
+void StrNCopy(char* dst, const char* src, int n) { nCopy(units(dst), units(src), n); }
 void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) { nCopy(dst, src, n); }
 
 // Concatenation
@@ -157,13 +229,13 @@ void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) { nCopy(dst, src, n); }
 namespace {
 
 template <typename Unit>
-[[gnu::always_inline]] inline void cat(Unit* dst, const Unit* src) {
+void cat(Unit* dst, const Unit* src) {
   if (!dst || !src) return;
   copyUnits(dst + length(dst), src, Endless{});
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
+STRUTIL_CORE void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
   if (!dst || !src) return;
   const int off = length(dst);
   if (n <= off + 1) return;
@@ -173,13 +245,13 @@ template <typename Unit>
 
 }  // namespace
 
-void StrCat(char* dst, const char* src) { cat(dst, src); }
+void StrCat(char* dst, const char* src) { cat(units(dst), units(src)); }
 void WStrCat(WCHAR* dst, const WCHAR* src) { cat(dst, src); }
 
-void StrCatBuf(char* dst, int n, const char* src) { nCatBuf(dst, n, src, noLimit); }
-void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) { nCatBuf(dst, n, src, noLimit); }
+void StrCatBuf(char* dst, int n, const char* src) { nCatBuf(units(dst), n, units(src), INT_MAX); }
+void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) { nCatBuf(dst, n, src, INT_MAX); }
 
-void WStrNCat(WCHAR* dst, const WCHAR* src, int num) { nCatBuf(dst, noLimit, src, num); }
+void WStrNCat(WCHAR* dst, const WCHAR* src, int num) { nCatBuf(dst, INT_MAX, src, num); }
 
 void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) { nCatBuf(dst, n, src, num); }
 
@@ -187,111 +259,129 @@ void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) { nCatBuf(dst, n,
 
 namespace {
 
-// How searches and comparisons take units: as they are, or letters without their case. Most units
-// that match are the same, so the rest is asked only of two that are not.
-struct Exact {
-  static int map(int unit) { return unit; }
-  static int other(int unit) { return unit; }  // the second unit that matches
-  static bool match(int, int) { return false; }
-};
-
-struct IgnoreCase {
-  static int map(int unit) { return CharToLower(unit); }
-  static int other(int unit) { return match(unit, unit ^ caseBit) ? unit ^ caseBit : unit; }
-  static bool match(int a, int b) {
-    return (a ^ b) == caseBit && isLetterFrom<'a'>(static_cast<unsigned>(a | b));
-  }
-};
+// Whether two units that differ are the two cases of a letter.
+STRUTIL_INLINE bool areCases(int a, int b) {
+  return (a ^ b) == caseBit && isLetterFrom('a', static_cast<unsigned>(a | b));
+}
 
 template <typename Unit>
-[[gnu::always_inline]] inline Unit* findUnit(const Unit* str, Unit c) {
+STRUTIL_CORE Unit* findUnit(Unit* str, unsigned c) {
   if (!str) return nullptr;
-  walk(
-      Endless{}, [c](Unit unit) { return rarely(unit == c) || rarely(unit == 0); }, str);
-  return *str == 0 ? nullptr : const_cast<Unit*>(str);
+  unsigned last = 0;
+  walk(Endless{}, str, [c, &last](unsigned unit) {
+    last = unit;
+    return !STRUTIL_RARELY(unit == c) && !STRUTIL_RARELY(unit == 0);
+  });
+  return last == 0 ? nullptr : str;
 }
 
 // Looks for the first unit of substr before it compares the rest. Where the rest fails at the
 // terminator of str, no later place has room for substr.
-template <typename Case, typename Unit>
-[[gnu::always_inline]] inline Unit* find(const Unit* str, const Unit* substr) {
+template <typename Unit>
+STRUTIL_CORE const Unit* find(const Unit* str, const Unit* substr, bool ignoreCase) {
   if (!str || !substr || *str == 0) return nullptr;
-  if (*substr == 0) return const_cast<Unit*>(str);
   const int first = *substr;
-  const int other = Case::other(first);
+  if (first == 0) return str;
+  const int other = ignoreCase && areCases(first, first ^ caseBit) ? first ^ caseBit : first;
   for (;; ++str) {
-    walk(
-        Endless{}, [=](int unit) { return unit == first || unit == other || unit == 0; }, str);
-    if (*str == 0) return nullptr;
+    int a = 0;
+    int b = 0;
+    walk(Endless{}, str, [=, &a](int unit) {
+      a = unit;
+      return unit != first && unit != other && unit != 0;
+    });
+    if (a == 0) return nullptr;
     const Unit* at = str + 1;
     const Unit* rest = substr + 1;
-    walk(
-        Endless{},
-        [](int a, int b) { return rarely(a != b) ? rarely(!Case::match(a, b)) : rarely(b == 0); },
-        at, rest);
-    if (*rest == 0) return const_cast<Unit*>(str);
-    if (*at == 0) return nullptr;
+    walk(Endless{}, at, rest, [=, &a, &b](int unit, int wanted) {
+      a = unit;
+      b = wanted;
+      if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(a, b);
+      if (STRUTIL_RARELY(a == 0)) return false;
+      return true;
+    });
+    if (b == 0) return str;
+    if (a == 0) return nullptr;
   }
 }
 
 }  // namespace
 
-char* StrChr(const char* str, const char c) { return findUnit(str, c); }
-WCHAR* WStrChr(const WCHAR* str, const WCHAR c) { return findUnit(str, c); }
+// A caller fills the register of `c` by the sign of its own plain char, and compilers trust that it
+// was by that of ours: the low 8 bits count.
+char* StrChr(const char* str, const char c) {
+  unsigned unit = static_cast<Byte>(c);
+  STRUTIL_OPAQUE(unit);
+  return text(findUnit(units(str), static_cast<Byte>(unit)));
+}
+WCHAR* WStrChr(const WCHAR* str, const WCHAR c) { return text(findUnit(str, c)); }
 
-char* StrStr(const char* str, const char* substr) { return find<Exact>(str, substr); }
-WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) { return find<Exact>(str, substr); }
+char* StrStr(const char* str, const char* substr) {
+  return text(find(units(str), units(substr), false));
+}
+WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) { return text(find(str, substr, false)); }
 
-char* StrIStr(const char* str, const char* substr) { return find<IgnoreCase>(str, substr); }
-WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) { return find<IgnoreCase>(str, substr); }
+char* StrIStr(const char* str, const char* substr) {
+  return text(find(units(str), units(substr), true));
+}
+WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) { return text(find(str, substr, true)); }
 
 // Comparison
 
 namespace {
 
 // Returns 0, or the position i + 1 of the first difference: negative where str1 has the smaller
-// unit. Equal units map to equal values, so only unequal ones are mapped.
-template <typename Case, typename Unit, typename Bound>
-[[gnu::always_inline]] inline int compare(const Unit* str1, const Unit* str2, Bound bound) {
+// unit. Units that are equal are not mapped, and the others only to see which is the smaller.
+template <typename Unit, typename Bound>
+STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, bool ignoreCase) {
   if (!str1 || !str2) return (str1 ? 1 : 0) - (str2 ? 1 : 0);
   if (str1 == str2) return 0;
   const Unit* at = str1;
-  const auto ends = [](int a, int b) {
-    return rarely(a != b) ? rarely(!Case::match(a, b)) : rarely(a == 0);
-  };
-  if (!walk(bound, ends, at, str2)) return 0;
-  const int difference = Case::map(*at) - Case::map(*str2);
+  int a = 0;
+  int b = 0;
+  const bool stopped = walk(bound, at, str2, [=, &a, &b](int unit1, int unit2) {
+    a = unit1;
+    b = unit2;
+    if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(a, b);
+    if (STRUTIL_RARELY(a == 0)) return false;
+    return true;
+  });
+  if (!stopped || a == b) return 0;
+  if (ignoreCase) {
+    a = CharToLower(a);
+    b = CharToLower(b);
+  }
   const int position = static_cast<int>(at - str1) + 1;
-  return difference == 0 ? 0 : difference < 0 ? -position : position;
+  return a < b ? -position : position;
 }
 
 }  // namespace
 
 int StrNCmp(const char* str1, const char* str2, int n) {
-  return compare<Exact>(str1, str2, Count{n});
+  return compare(units(str1), units(str2), Count{n}, false);
 }
 int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) {
-  return compare<Exact>(str1, str2, Count{n});
+  return compare(str1, str2, Count{n}, false);
 }
 
 // Irregular by contract: every difference is negative, only the null rule gives a positive result.
 int StrNICmp(const char* str1, const char* str2, int n) {
-  const int result = compare<IgnoreCase>(str1, str2, Count{n});
+  const int result = compare(units(str1), units(str2), Count{n}, true);
   return str1 && str2 && result > 0 ? -result : result;
 }
 int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) {
-  return compare<IgnoreCase>(str1, str2, Count{n});
+  return compare(str1, str2, Count{n}, true);
 }
 
-int StrCmp(const char* str1, const char* str2) { return compare<Exact>(str1, str2, Endless{}); }
-int WStrCmp(const WCHAR* str1, const WCHAR* str2) { return compare<Exact>(str1, str2, Endless{}); }
+int StrCmp(const char* str1, const char* str2) {
+  return compare(units(str1), units(str2), Whole{}, false);
+}
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) { return compare(str1, str2, Whole{}, false); }
 
 int StrICmp(const char* str1, const char* str2) {
-  return compare<IgnoreCase>(str1, str2, Endless{});
+  return compare(units(str1), units(str2), Whole{}, true);
 }
-int WStrICmp(const WCHAR* str1, const WCHAR* str2) {
-  return compare<IgnoreCase>(str1, str2, Endless{});
-}
+int WStrICmp(const WCHAR* str1, const WCHAR* str2) { return compare(str1, str2, Whole{}, true); }
 
 // Tokenizing and splitting
 
@@ -300,17 +390,18 @@ namespace {
 // StrChr for sets, which are short: a turn of the walk costs more than it saves. No set contains
 // the terminator.
 template <typename Unit>
-[[gnu::always_inline]] inline bool contains(const Unit* set, Unit unit) {
-  if (*set == unit) return unit != 0;
-  if (*set == 0) return false;
-  while (*++set != 0) {
-    if (*set == unit) return true;
+STRUTIL_CORE bool contains(const Unit* set, unsigned unit) {
+  unsigned one = *set;
+  if (one == unit) return unit != 0;
+  if (one == 0) return false;
+  while ((one = *++set) != 0) {
+    if (one == unit) return true;
   }
   return false;
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline Unit* token(Unit* str, int* off, const Unit* dlmt) {
+STRUTIL_CORE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   if (!str || !off || !dlmt) return nullptr;
   Unit* start = str + *off;
   while (contains(dlmt, *start)) ++start;
@@ -325,18 +416,20 @@ template <typename Unit>
   return start;
 }
 
-template <typename Unit>
-[[gnu::always_inline]] inline int split(Unit* str, const Unit* dlmt, Unit** wrd) {
+template <typename Text>
+int split(Text* str, const Text* dlmt, Text** wrd) {
   if (!wrd) return 0;
   int off = 0;
   int num = 0;
-  while (Unit* tk = token(str, &off, dlmt)) wrd[num++] = tk;
+  while (auto* const tk = token(units(str), &off, units(dlmt))) wrd[num++] = text(tk);
   return num;
 }
 
 }  // namespace
 
-char* StrToken(char* str, int* off, const char* dlmt) { return token(str, off, dlmt); }
+char* StrToken(char* str, int* off, const char* dlmt) {
+  return text(token(units(str), off, units(dlmt)));
+}
 WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) { return token(str, off, dlmt); }
 
 int StrSplit(char* str, const char* dlmt, char** wrd) { return split(str, dlmt, wrd); }
@@ -347,64 +440,64 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dl
 namespace {
 
 // Pairs such as these let a template call the twin of its own width.
-int len(const char* str) { return StrLen(str); }
-int len(const WCHAR* str) { return WStrLen(str); }
+int strLen(const Byte* str) { return StrLen(text(str)); }
+int strLen(const WCHAR* str) { return WStrLen(str); }
 
-void copyText(char* dst, const char* src) { StrCopy(dst, src); }
-void copyText(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
+void strCopy(Byte* dst, const Byte* src) { StrCopy(text(dst), text(src)); }
+void strCopy(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
 
 template <typename Unit>
-[[gnu::always_inline]] inline int trim(Unit* str, const Unit* trimSet) {
+int trim(Unit* str, const Unit* trimSet) {
   if (!str) return 0;
   const Unit emptySet = 0;
   if (!trimSet) trimSet = &emptySet;
   Unit* first = str;
   while (contains(trimSet, *first)) ++first;
-  Unit* end = first + len(first);
+  Unit* end = first + strLen(first);
   while (end > first + 1 && contains(trimSet, end[-1])) --end;
   *end = 0;
   const int kept = static_cast<int>(end - first);
-  copyText(str, first);
+  strCopy(str, first);
   return kept;
 }
 
 }  // namespace
 
-int StrTrim(char* str, const char* trimSet) { return trim(str, trimSet); }
+int StrTrim(char* str, const char* trimSet) { return trim(units(str), units(trimSet)); }
 int WStrTrim(WCHAR* str, const WCHAR* trimSet) { return trim(str, trimSet); }
 
 // Replacing
 
 namespace {
 
-const char* search(const char* str, const char* substr) { return StrStr(str, substr); }
-const WCHAR* search(const WCHAR* str, const WCHAR* substr) { return WStrStr(str, substr); }
+const Byte* strStr(const Byte* str, const Byte* substr) {
+  return units(StrStr(text(str), text(substr)));
+}
+const WCHAR* strStr(const WCHAR* str, const WCHAR* substr) { return WStrStr(str, substr); }
 
-// The building pass finds the occurrences of the counting pass again: to remember them would take
-// memory that the library does not have.
 template <typename Unit>
-[[gnu::always_inline]] inline int replace(const Unit* orig, const Unit* rep, const Unit* with,
-                                          Unit* result) {
+int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
-  const int len_rep = len(rep);
-  int count = 0;
-  for (const Unit* ins = search(orig, rep); ins; ins = search(ins + len_rep, rep)) ++count;
-  if (!result) return count * (len(with) - len_rep) + len(orig);
-  Unit* tmp = result;
-  for (; count > 0; --count) {
-    const Unit* const ins = search(orig, rep);
-    tmp = copyUnits(tmp, orig, Count{static_cast<int>(ins - orig)});
-    tmp = copyUnits(tmp, with, Endless{});
+  const int len_rep = strLen(rep);
+  const int len_with = strLen(with);
+  int length = 0;
+  while (const Unit* const ins = strStr(orig, rep)) {
+    const int len_front = static_cast<int>(ins - orig);
+    if (result) {
+      Unit* tmp = copyUnits(result + length, orig, Count{len_front});
+      copyUnits(tmp, with, Endless{});
+    }
+    length += len_front + len_with;
     orig = ins + len_rep;
   }
-  copyText(tmp, orig);
-  return len(result);
+  if (result) strCopy(result + length, orig);
+  return length + strLen(orig);
 }
 
 }  // namespace
 
 int StrReplace(const char* orig, const char* rep, const char* with, char* result) {
-  return replace(orig, rep, with, result);
+  return replace(units(orig), units(rep), units(with), units(result));
 }
 int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) {
   return replace(orig, rep, with, result);
@@ -414,26 +507,39 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* r
 
 namespace {
 
-constexpr int mostNegative = -noLimit - 1;
+struct Division {
+  int quotient;
+  int remainder;
+};
 
-// A variable radix makes one division of the quotient and the remainder. The most negative int has
-// no positive counterpart: its first division is of the value itself.
+Division divide(int dividend, int divisor) {
+#if defined(STRUTIL_IDIVMOD)
+  const uint64_t both = STRUTIL_IDIVMOD(dividend, divisor);
+  return {static_cast<int>(both), static_cast<int>(both >> 32)};
+#else
+  return {dividend / divisor, dividend % divisor};
+#endif
+}
+
 template <typename Unit>
-[[gnu::always_inline]] inline Unit* fromInt(int value, Unit* string, int radix) {
+Unit digitOf(unsigned value) {
+  return static_cast<Unit>(value < 10 ? '0' + value : 'a' - 10 + value);
+}
+
+// The most negative int has no positive counterpart: its first division is of the value itself.
+template <typename Unit>
+Unit* fromInt(int value, Unit* string, int radix) {
   if (!string) return nullptr;
   *string = 0;
   if (radix < 1 || (radix == 1 && value != 0)) return string;
   const bool negative = value < 0;
-  if (negative && value != mostNegative) value = -value;
+  if (negative && value != INT_MIN) value = -value;
   Unit* end = string;
   do {
-    int digit = value % radix;
-    value = value / radix;
-    if (rarely(value < 0)) {
-      value = -value;
-      digit = -digit;
-    }
-    *end++ = static_cast<Unit>(digit < 10 ? '0' + digit : 'a' - 10 + digit);
+    Division by = divide(value, radix);
+    if (STRUTIL_RARELY(value < 0)) by = {-by.quotient, -by.remainder};
+    *end++ = digitOf<Unit>(static_cast<unsigned>(by.remainder));
+    value = by.quotient;
   } while (value != 0);
   if (negative) *end++ = '-';
   *end = 0;
@@ -446,30 +552,29 @@ template <typename Unit>
 }
 
 template <typename Unit>
-[[gnu::always_inline]] inline int toInt(const Unit* string) {
+int toInt(const Unit* string) {
   if (!string) return 0;
   while (*string == ' ' || *string == '\t') ++string;
   const bool negative = *string == '-';
   if (negative) ++string;
   unsigned val = 0;
-  walk(
-      Endless{},
-      [&val](unsigned unit) {
-        const unsigned digit = unit - '0';
-        if (digit > 9) return true;
-        val = val * 10 + digit;
-        return false;
-      },
-      string);
+  walk(Endless{}, string, [&val](unsigned unit) {
+    const unsigned digit = unit - '0';
+    if (digit > 9) return false;
+    val = val * 10 + digit;
+    return true;
+  });
   return static_cast<int>(negative ? 0 - val : val);
 }
 
 }  // namespace
 
-char* IntToStr(int value, char* string, int radix) { return fromInt(value, string, radix); }
+char* IntToStr(int value, char* string, int radix) {
+  return text(fromInt(value, units(string), radix));
+}
 WCHAR* IntToWStr(int value, WCHAR* string, int radix) { return fromInt(value, string, radix); }
 
-int StrToInt(const char* string) { return toInt(string); }
+int StrToInt(const char* string) { return toInt(units(string)); }
 int WStrToInt(const WCHAR* string) { return toInt(string); }
 
 // Width conversion
@@ -477,56 +582,64 @@ int WStrToInt(const WCHAR* string) { return toInt(string); }
 namespace {
 
 template <typename To, typename From>
-[[gnu::always_inline]] inline void copyCount(To*& des, const From*& src, int count) {
-  const auto copyOne = [](To& to, From from) {
+STRUTIL_CORE void copyCount(To* des, const From* src, int count) {
+  walk(Count{count}, des, src, [](To& to, From from) {
     to = from;
-    return false;
-  };
-  walk(Count{count}, copyOne, des, src);
+    return true;
+  });
 }
 
+#if defined(STRUTIL_ALIASING)
 // Two units in one word. Word by word is also unit by unit, forward, where the arrays overlap: both
 // being aligned, they are an even number of units apart.
-using Pair [[gnu::may_alias]] = uint32_t;
+struct STRUTIL_ALIASING Pair {
+  uint32_t units;
+};
 
 bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % sizeof(Pair) == 0; }
+#endif
 
 // The library's only constant data.
 constexpr char emptyText[] = "";
-constexpr char escapeStart[] = "&(0x";
 
 }  // namespace
 
 void BytesToWords(const char* src, WORD* des, int len) {
-  if (src && des) copyCount(des, src, len);
+  if (src && des) copyCount(des, units(src), len);
 }
 
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
   if (!des) return nullptr;
   *des = 0;
-  if (src) *copyUnits(des, src, Count{bufsize < 1 ? 0 : bufsize - 1}) = 0;
+  if (src) *copyUnits(des, units(src), Count{bufsize < 1 ? 0 : bufsize - 1}) = 0;
   return des;
 }
 
 char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
   if (!des) return const_cast<char*>(emptyText);
-  const auto copyPrintable = [](char& to, WCHAR from) {
-    if (from < ' ' || from > '~') return true;
-    to = static_cast<char>(from);
-    return false;
+  Byte* const start = units(des);
+  *start = 0;
+  if (!src || bufsize < 1) return des;
+  Byte* at = start;
+  const auto room = [&] { return bufsize - static_cast<int>(at - start); };  // for a terminator too
+  unsigned unit = 0;
+  const auto copyPrintable = [&](Byte& to, unsigned from) {
+    unit = from;
+    if (unit < ' ' || unit > '~') return false;
+    to = static_cast<Byte>(unit);
+    return true;
   };
-  char* at = des;
-  while (src) {
-    const int room = bufsize - static_cast<int>(at - des);  // the terminator's unit included
-    if (!walk(Count{room < 1 ? 0 : room - 1}, copyPrintable, at, src) || *src == 0) break;
-    char strbuf[5];
-    IntToStr(*src++, strbuf, 16);
-    if (static_cast<int>(at - des) + StrLen(strbuf) + 5 >= bufsize) break;
-    *at = 0;
-    StrCat(at, escapeStart);
-    StrCat(at, strbuf);
-    at += StrLen(at);
+  while (walk(Count{room() - 1}, at, src, copyPrintable) && unit != 0) {
+    int shift = 12;  // of the first digit
+    while (shift > 0 && unit >> shift == 0) shift -= 4;
+    if (room() < (shift >> 2) + 7) break;
+    *at++ = '&';
+    *at++ = '(';
+    *at++ = '0';
+    *at++ = 'x';
+    for (; shift >= 0; shift -= 4) *at++ = digitOf<Byte>(unit >> shift & 15);
     *at++ = ')';
+    ++src;
   }
   *at = 0;
   return des;
@@ -534,13 +647,19 @@ char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
 
 void WStrToWords(const WCHAR* src, WORD* des, int len) {
   if (!src || !des || len < 1) return;
+#if defined(STRUTIL_ALIASING)
   if (isAligned(src) && isAligned(des)) {
-    Pair* to = reinterpret_cast<Pair*>(des);
-    const Pair* from = reinterpret_cast<const Pair*>(src);
-    copyCount(to, from, len >> 1);
-    des = reinterpret_cast<WORD*>(to);
-    src = reinterpret_cast<const WCHAR*>(from);
-    len &= 1;
+    copyCount(static_cast<Pair*>(static_cast<void*>(des)),
+              static_cast<const Pair*>(static_cast<const void*>(src)), len >> 1);
+    if ((len & 1) != 0) des[len - 1] = src[len - 1];
+    return;
   }
+#endif
   copyCount(des, src, len);
 }
+
+#if defined(__clang__)
+#pragma clang attribute pop
+#elif defined(__GNUC__)
+#pragma GCC pop_options
+#endif

@@ -32,14 +32,17 @@ TEST_CASE_TEMPLATE("IntToStr texts take the sizes that the header states", Unit,
 TEST_CASE_TEMPLATE("StrToInt reads spaces, a sign and digits", Unit, char, WCHAR) {
   CHECK(twin::ToInt<Unit>(nullptr) == 0);
   std::vector<Units> texts = allTexts(u" \t-19x", 4);
-  for (const char16_t* const text :
-       {u"  42",       u"\t\t-42x",    u"12a34",
-        u"007",        u"\n5",         u"\r7",
-        u"+5",         u"/1",          u":1",
-        u"5:",         u"6/",          u"2147483647",
-        u"2147483648", u"-2147483648", u"4294967296",
-        u"4294967297", u"-4294967297", u"123456789012345678901234567890",
-        u"\u00b11",    u"\u00a01",     u"1\u00b2"}) {
+  for (const char16_t* const text : {u"  42",        u"\t\t-42x",
+                                     u"12a34",       u"007",
+                                     u"\n5",         u"\r7",
+                                     u"+5",          u"/1",
+                                     u":1",          u"5:",
+                                     u"6/",          u"2147483647",
+                                     u"2147483648",  u"-2147483648",
+                                     u"4294967296",  u"4294967297",
+                                     u"-4294967297", u"123456789012345678901234567890",
+                                     u"\u00b11",     u"\u00a01",
+                                     u"1\u00b2",     u"         \t \t        -8765432109x"}) {
     texts.emplace_back(text);
   }
   for (const Units& text : texts) checkToInt<Unit>(text);
@@ -59,6 +62,9 @@ TEST_CASE("BytesToWords and WStrToWords copy the count for every alignment") {
   for (const int from : {0, 1}) {
     for (const int to : {0, 1}) {
       for (int len = -1; len < 9; ++len) checkWords(units, len, from, to);
+      for (int len = 10; len < 300; len += len < 26 ? 1 : 91) {
+        checkWords(longText(300), len, from, to);
+      }
     }
   }
   for (const int len : {INT_MIN, 3}) {
@@ -93,6 +99,9 @@ TEST_CASE("BytesToWords and WStrToWords run forward where the arrays overlap") {
 }
 
 TEST_CASE("StrToWStr widens what fits") {
+  for (const int bufsize : {12, 13, 16, 17, 20, 21, 255, 256, 257, 300, 301, INT_MAX}) {
+    checkWiden(longText(300), bufsize);
+  }
   for (const int bufsize : {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, INT_MAX}) {
     for (const Units& src : {u""s, u"\u00e9\u00ff"s, u"abcdefg"s}) checkWiden(src, bufsize);
     Buffer<WCHAR> emptied;
@@ -109,7 +118,12 @@ TEST_CASE("WStrToStr escapes what is not printable and cuts between units") {
       u"abcdefghij"};
   for (const Units& src : sources) {
     checkEscape(src, INT_MIN);
+    checkEscape(src, INT_MAX);
     for (int bufsize = -1; bufsize < 50; ++bufsize) checkEscape(src, bufsize);
+  }
+  for (const int bufsize : {255, 256, 257, 700, INT_MAX}) checkEscape(longText(300), bufsize);
+  for (int unit = 1; unit < 0x10000; unit += unit < 300 ? 1 : 251) {
+    checkEscape(Units(1, static_cast<char16_t>(unit)), 10);
   }
 }
 

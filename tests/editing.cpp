@@ -5,6 +5,16 @@ namespace {
 const std::vector<Units> texts = allTexts(u"a,;\u00e9", 4);
 const std::vector<Units> sets = {u"", u",", u",;", u";,;,", u"\u00e9", u"\u00e9a;,"};
 
+// Tokens of every length up to 15 and as many as that, between runs of all units of a set of 6.
+const Units manySet = u",; .\u00fe\t";
+Units manyTokens() {
+  Units line;
+  for (size_t i = 0; i < 16; ++i) {
+    line += manySet.substr(i % 6) + manySet.substr(0, i % 4) + longText(i);
+  }
+  return line + manySet + manySet;
+}
+
 TEST_SUITE_BEGIN("Tokenizing and splitting");
 
 TEST_CASE_TEMPLATE("StrToken and StrSplit walk to the end", Unit, char, WCHAR) {
@@ -16,6 +26,8 @@ TEST_CASE_TEMPLATE("StrToken and StrSplit walk to the end", Unit, char, WCHAR) {
       }
     }
   }
+  checkSplit<Unit>(manyTokens(), manySet);
+  checkWalk<Unit>(manyTokens(), manySet, 0);
 }
 
 TEST_CASE_TEMPLATE("StrToken takes another set at each call", Unit, char, WCHAR) {
@@ -50,13 +62,19 @@ TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char
   for (const Units& text : texts) {
     for (const Units& set : sets) checkTrim<Unit>(text, set);
   }
+  checkTrim<Unit>(manyTokens(), manySet);
+  checkTrim<Unit>(manySet + manySet + manySet, manySet);
 }
 
 TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {
-  Buffer<Unit> str(u" a \0"s);
-  CHECK(twin::Trim<Unit>(str.get(), nullptr) == 3);
-  str.check(u" a \0"s);
-  CHECK(twin::Trim<Unit>(nullptr, str.get()) == 0);
+  Text<Unit> set(u" ");
+  CHECK(twin::Trim<Unit>(nullptr, set.get()) == 0);
+  for (char16_t unit = 1; unit < 256; ++unit) {
+    const Units text = Units(1, unit) + u"a" + unit + u'\0';
+    Buffer<Unit> str(text);
+    CHECK(twin::Trim<Unit>(str.get(), nullptr) == 3);
+    str.check(text);
+  }
 }
 
 TEST_SUITE_END();
@@ -73,6 +91,12 @@ TEST_CASE_TEMPLATE("StrReplace sizes and fills alike", Unit, char, WCHAR) {
     }
   }
   checkReplace<Unit>(u"Dear ${name}, ${name}: ${names}", u"${name}", u"Zo\u00eb Q.");
+  const Units text = longText(300);
+  for (const Units& pattern : {u"a"s, text.substr(100, 24), text.substr(276), text}) {
+    for (const Units& replacement : {u""s, u"b"s, longText(25)}) {
+      checkReplace<Unit>(text + u"-" + text, pattern, replacement);
+    }
+  }
 }
 
 TEST_CASE_TEMPLATE("StrReplace writes nothing for null and for an empty pattern", Unit, char,

@@ -8,7 +8,7 @@ namespace {
 
 // Mostly letters and separators, which have something to match; any unit now and then.
 template <typename Unit>
-Units textFrom(FuzzedDataProvider& data, size_t longest = 12) {
+Units textFrom(FuzzedDataProvider& data, size_t longest = 40) {
   Units text;
   for (size_t length = data.ConsumeIntegralInRange<size_t>(0, longest); text.size() < length;) {
     const auto unit =
@@ -21,13 +21,13 @@ Units textFrom(FuzzedDataProvider& data, size_t longest = 12) {
 }
 
 int boundFrom(FuzzedDataProvider& data) {
-  return data.ConsumeBool() ? data.ConsumeIntegralInRange(-2, 20) : data.ConsumeIntegral<int>();
+  return data.ConsumeBool() ? data.ConsumeIntegralInRange(-2, 50) : data.ConsumeIntegral<int>();
 }
 
 template <typename Unit>
 void checkOne(FuzzedDataProvider& data) {
   const Units a = textFrom<Unit>(data);
-  const Units b = textFrom<Unit>(data, 4);
+  const Units b = textFrom<Unit>(data, 9);
   const int n = boundFrom(data);
   const int m = boundFrom(data);
   switch (data.ConsumeIntegralInRange(0, 13)) {

@@ -16,6 +16,10 @@ TEST_CASE_TEMPLATE("StrLen, StrUpper and StrLower walk the whole text", Unit, ch
   for (size_t start = 0; start <= text.size(); ++start) {
     checkLengthAndCase<Unit>(text.substr(start));
   }
+  for (size_t length = 12; length < 40; ++length) checkLengthAndCase<Unit>(longText(length));
+  Units every;
+  for (char16_t unit = 255; unit > 0; --unit) every += unit;
+  checkLengthAndCase<Unit>(every + every);
 }
 
 TEST_CASE("CharToLower and CharToUpper map the 26 letters and nothing else") {
@@ -52,6 +56,9 @@ TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf and StrNCopy write what fits and no unit
     for (const int n : {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, INT_MAX}) {
       checkCopies<Unit>(u"a\u00ffbcdef"s.substr(0, length), n);
     }
+  }
+  for (const int n : {12, 13, 16, 17, 20, 21, 255, 256, 257, 299, 300, 301, 302}) {
+    checkCopies<Unit>(longText(300), n);
   }
 }
 
@@ -115,6 +122,10 @@ TEST_CASE_TEMPLATE("StrCat, StrCatBuf and the wide appends add what the bounds a
       }
     }
   }
+  for (const int bound : {12, 13, 16, 20, 21, 22, 255, 256, 257, 258, 277, 278, 279, 280}) {
+    checkAppends<Unit>(longText(21), longText(257), bound, INT_MAX);
+    checkAppends<Unit>(longText(257), longText(21), INT_MAX, bound);
+  }
 }
 
 TEST_CASE_TEMPLATE("StrCat and StrCatBuf write nothing for a null pointer", Unit, char, WCHAR) {
@@ -140,6 +151,8 @@ TEST_CASE_TEMPLATE("StrChr finds the first such unit but never the terminator", 
   for (const Units& text : allTexts(u"ab\u00e9", 6)) {
     for (const char16_t c : u"\0ab\u00e9"s) checkFindUnit<Unit>(text, c);
   }
+  const Units text = longText(300) + u"#";
+  for (size_t start = 0; start <= 300; ++start) checkFindUnit<Unit>(text.substr(start), u'#');
 }
 
 TEST_CASE("Wide searches and comparisons compare all 16 bits") {
@@ -173,8 +186,28 @@ TEST_CASE_TEMPLATE("StrStr and StrIStr find the first place", Unit, char, WCHAR)
 }
 
 TEST_CASE_TEMPLATE("StrStr and StrIStr go on after a long partial match", Unit, char, WCHAR) {
-  for (const Units& substr : {u"ababacu"s, u"ABABACU"s, u"`"s, u"{"s}) {
+  for (const Units& substr : {u"ababacu"s, u"ABABACU"s}) {
     checkFind<Unit>(u"@[ababac-abababacus", substr);
+  }
+  const Units text = longText(300);
+  for (size_t length = 1; length < 30; ++length) {
+    for (const Units& ending : {u""s, u"#"s, text.substr(0, 1)}) {
+      checkFind<Unit>(text + u"#" + text, text.substr(300 - length) + ending);
+    }
+  }
+}
+
+TEST_CASE_TEMPLATE("StrIStr, StrICmp and StrNICmp fold the 26 letters and nothing else", Unit, char,
+                   WCHAR) {
+  for (char16_t unit = 1; unit < 256; ++unit) {
+    for (const int other : {unit ^ 32, unit + 32, unit - 32, unit ^ 64, unit ^ 128, unit + 1}) {
+      if (other < 1 || other > 255) continue;
+      const Units one(1, unit);
+      const Units two(1, static_cast<char16_t>(other));
+      checkCompare<Unit>(one + u"x", two + u"y", 2);
+      checkFind<Unit>(u"-" + one, two);
+      checkFind<Unit>(u"--" + one + u"-", u"-" + two);
+    }
   }
 }
 
@@ -211,10 +244,17 @@ TEST_CASE_TEMPLATE("All comparisons tell place and order of the first difference
   const std::vector<Units> texts = allTexts(alphabet, 3);
   for (const Units& a : texts) {
     for (const Units& b : texts) {
-      for (const Units& head : {u""s, u"xYz"s}) {  // differences on both sides of a turn's end
-        for (const int n : {INT_MIN, 0, 2, 3, 4, INT_MAX}) {
-          checkCompare<Unit>(head + a, head + b, n);
-        }
+      // Differences on both sides of a turn's end.
+      for (const int n : {INT_MIN, 0, 1, 2, 3, INT_MAX}) checkCompare<Unit>(a, b, n);
+      for (const int n : {4, 5, 6}) checkCompare<Unit>(u"xYz" + a, u"xYz" + b, n);
+    }
+  }
+  const Units text = longText(300);
+  for (size_t length = 5; length < 300; length += length < 25 ? 1 : 91) {
+    for (const auto& [a, b] : {std::pair(u"a", u"b"), {u"B", u"a"}, {u"", u"z"}, {u"z", u"Z"}}) {
+      for (const int more : {-1, 0, 1, 2}) {
+        const int n = static_cast<int>(length) + more;
+        checkCompare<Unit>(text.substr(0, length) + a, text.substr(0, length) + b, n);
       }
     }
   }

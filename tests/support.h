@@ -84,8 +84,9 @@ class Buffer {
 
   // Checks that the buffer starts with `written` and that no other unit has changed.
   void check(const Units& written) {
-    const std::vector<Unit> expected = exact<Unit>(before.replace(margin, written.size(), written));
-    CHECK(show(valuesOf(now)) == show(valuesOf(expected)));
+    Units expected = before;
+    expected.replace(margin, written.size(), written);
+    CHECK(show(valuesOf(now)) == show(valuesOf(exact<Unit>(expected))));
   }
 
  private:
@@ -94,6 +95,15 @@ class Buffer {
   Units before;
   std::vector<Unit> now;
 };
+
+// n units of all kinds, without a separator, in an order that does not repeat.
+inline Units longText(size_t n) {
+  Units text;
+  for (unsigned state = 1; text.size() < n; state = state * 75 % 65537) {
+    text += u"aZ_\u00e1mA{zM@1"[state % 11];
+  }
+  return text;
+}
 
 // All texts of up to `longest` units of an alphabet.
 inline std::vector<Units> allTexts(const Units& alphabet, size_t longest) {
