@@ -1,10 +1,8 @@
 #include "core.h"
 
-#include <fcntl.h>
-#include <gelf.h>
-#include <unistd.h>
-
 #include <algorithm>
+#include <cstdio>
+#include <sstream>
 #include <stdexcept>
 
 namespace {
@@ -12,10 +10,20 @@ namespace {
 constexpr uint32_t flashSize = 0x100000;
 constexpr uint32_t ram = 0x20000000;
 constexpr uint32_t ramSize = 0x10000;
+constexpr uint32_t stackTop = ram + ramSize;
 constexpr uint32_t returnAddress = 0x000F0000;  // flash that no image uses
 
 void must(uc_err error) {
   if (error != UC_ERR_OK) throw std::runtime_error(uc_strerror(error));
+}
+
+// What a command prints.
+std::istringstream outputOf(const std::string& command) {
+  FILE* const pipe = popen(command.c_str(), "r");
+  std::string output;
+  for (int c = 0; pipe && (c = getc(pipe)) != EOF;) output += static_cast<char>(c);
+  if (!pipe || pclose(pipe) != 0) throw std::runtime_error(command);
+  return std::istringstream(output);
 }
 
 uint64_t bitCount(uint32_t bits) { return static_cast<uint64_t>(__builtin_popcount(bits)); }
@@ -41,53 +49,46 @@ bool isConditionalBranch(uint16_t op) { return (op & 0xF000) == 0xD000 && (op & 
 
 }  // namespace
 
-Core::Core(const std::string& elf) {
+Core::Core(const std::string& image) {
   must(uc_open(UC_ARCH_ARM, static_cast<uc_mode>(UC_MODE_THUMB | UC_MODE_MCLASS), &engine));
   must(uc_ctl_set_cpu_model(engine, UC_CPU_ARM_CORTEX_M0));
   must(uc_mem_map(engine, 0, flashSize, UC_PROT_ALL));
   must(uc_mem_map(engine, ram, ramSize, UC_PROT_ALL));
-  uc_hook hook = 0;
-  must(uc_hook_add(engine, &hook, UC_HOOK_CODE, reinterpret_cast<void*>(onCode), this, 1, 0));
-  must(uc_hook_add(engine, &hook, UC_HOOK_MEM_READ, reinterpret_cast<void*>(onRead), this, data,
-                   data + dataSize - 1));
-  must(uc_hook_add(engine, &hook, UC_HOOK_MEM_WRITE, reinterpret_cast<void*>(onWrite), this, data,
-                   data + dataSize - 1));
+  const auto add = [this](int type, void* hooked, uint64_t from, uint64_t to) {
+    uc_hook hook = 0;
+    must(uc_hook_add(engine, &hook, type, hooked, this, from, to));
+  };
+  add(UC_HOOK_CODE, reinterpret_cast<void*>(onCode), 1, 0);
+  add(UC_HOOK_MEM_READ, reinterpret_cast<void*>(onRead), data, data + dataSize - 1);
+  add(UC_HOOK_MEM_WRITE, reinterpret_cast<void*>(onWrite), data, data + dataSize - 1);
+  add(UC_HOOK_MEM_WRITE, reinterpret_cast<void*>(onPush), data + dataSize, stackTop - 1);
 
-  elf_version(EV_CURRENT);
-  const int file = open(elf.c_str(), O_RDONLY | O_CLOEXEC);
-  Elf* const image = elf_begin(file, ELF_C_READ, nullptr);
-  if (!image || elf_kind(image) != ELF_K_ELF) throw std::runtime_error("no image " + elf);
-  size_t segments = 0;
-  elf_getphdrnum(image, &segments);
-  size_t length = 0;
-  const char* const bytes = elf_rawfile(image, &length);
-  for (size_t i = 0; i < segments; ++i) {
-    GElf_Phdr segment;
-    gelf_getphdr(image, static_cast<int>(i), &segment);
-    if (segment.p_type != PT_LOAD || segment.p_filesz == 0) continue;
-    must(uc_mem_write(engine, segment.p_vaddr, bytes + segment.p_offset, segment.p_filesz));
-  }
-  for (Elf_Scn* section = elf_nextscn(image, nullptr); section;
-       section = elf_nextscn(image, section)) {
-    GElf_Shdr header;
-    gelf_getshdr(section, &header);
-    if (header.sh_type != SHT_SYMTAB) continue;
-    Elf_Data* const symbols = elf_getdata(section, nullptr);
-    for (size_t i = 0; i < header.sh_size / header.sh_entsize; ++i) {
-      GElf_Sym symbol;
-      gelf_getsym(symbols, static_cast<int>(i), &symbol);
-      if (GELF_ST_TYPE(symbol.st_info) != STT_FUNC) continue;
-      functions[elf_strptr(image, header.sh_link, symbol.st_name)] = {
-          static_cast<uint32_t>(symbol.st_value), static_cast<uint32_t>(symbol.st_size)};
+  uint32_t address = 0;
+  auto bytes = outputOf("arm-none-eabi-objcopy -O verilog '" + image + "' /dev/stdout");
+  for (std::string word; bytes >> word;) {
+    if (word[0] == '@') {
+      address = static_cast<uint32_t>(std::stoul(word.substr(1), nullptr, 16));
+    } else {
+      const auto byte = static_cast<uint8_t>(std::stoul(word, nullptr, 16));
+      must(uc_mem_write(engine, address++, &byte, 1));
     }
   }
-  elf_end(image);
-  close(file);
+  auto symbols = outputOf("arm-none-eabi-nm -S --defined-only --format=posix '" + image + "'");
+  for (std::string line; std::getline(symbols, line);) {
+    std::istringstream fields(line);
+    std::string name;
+    char type = 0;
+    Symbol function;
+    fields >> name >> type >> std::hex >> function.address >> function.size;
+    if ((type != 'T' && type != 't' && type != 'W') || name[0] == '$') continue;
+    functions[name] = function;
+    namesByAddress[function.address] = name;
+  }
 }
 
 Core::~Core() { uc_close(engine); }
 
-const Function* Core::find(const std::string& name) const {
+const Symbol* Core::find(const std::string& name) const {
   const auto found = functions.find(name);
   return found == functions.end() ? nullptr : &found->second;
 }
@@ -103,15 +104,14 @@ std::vector<uint8_t> Core::read(uint32_t address, size_t size) const {
   return bytes;
 }
 
-Run Core::call(const Function& function, const std::vector<uint32_t>& arguments) {
+Run Core::call(const Symbol& function, const std::vector<uint32_t>& arguments) {
   run = {};
   branchFrom = 0;
   for (size_t i = 0; i < arguments.size(); ++i) {
     must(uc_reg_write(engine, UC_ARM_REG_R0 + static_cast<int>(i), &arguments[i]));
   }
-  const uint32_t stack = ram + ramSize;
   const uint32_t link = returnAddress | 1;
-  must(uc_reg_write(engine, UC_ARM_REG_SP, &stack));
+  must(uc_reg_write(engine, UC_ARM_REG_SP, &stackTop));
   must(uc_reg_write(engine, UC_ARM_REG_LR, &link));
   constexpr size_t limit = 1000000;
   const uc_err error = uc_emu_start(engine, function.address | 1, returnAddress, 0, limit);
@@ -129,6 +129,9 @@ void Core::onCode(uc_engine* engine, uint64_t address, uint32_t size, void* self
   must(uc_mem_read(engine, address, &op, sizeof op));
   core.run.cycles += costOf(op, size);
   core.branchFrom = isConditionalBranch(op) ? static_cast<uint32_t>(address) : 0;
+  core.at = address;
+  const auto entered = core.namesByAddress.find(address);
+  if (entered != core.namesByAddress.end()) core.run.functions.insert(entered->second);
 }
 
 void Core::onRead(uc_engine*, uc_mem_type, uint64_t address, int size, int64_t, void* self) {
@@ -140,4 +143,11 @@ void Core::onRead(uc_engine*, uc_mem_type, uint64_t address, int size, int64_t, 
 void Core::onWrite(uc_engine*, uc_mem_type, uint64_t address, int size, int64_t, void* self) {
   Core& core = *static_cast<Core*>(self);
   std::fill_n(core.readable.begin() + static_cast<std::ptrdiff_t>(address - data), size, true);
+}
+
+void Core::onPush(uc_engine*, uc_mem_type, uint64_t address, int, int64_t, void* self) {
+  Core& core = *static_cast<Core*>(self);
+  const auto running = std::prev(core.namesByAddress.upper_bound(core.at));
+  if (running->second.rfind("__", 0) == 0) return;
+  core.run.stack = std::max(core.run.stack, stackTop - static_cast<uint32_t>(address));
 }

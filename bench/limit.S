@@ -98,80 +98,20 @@
 4:      movs    r0, #0
         pop     {r4, pc}
 
-        function \w\()StrICmp                   @ the same; 16 for letters of other case
-        push    {r4, r5, r6, lr}
-        movs    r4, r0
-        movs    r6, #32
-1:      .irp    k, 0, 1, 2, 3, 4, 5, 6, 7
-        ldr\x   r2, [r0, #\k * \s]
-        ldr\x   r3, [r1, #\k * \s]
-        rsbs    r5, r2, #0
-        adcs    r5, r3
-        bne     .L\w\()StrICmp2_\k
-.L\w\()StrICmp3_\k:
-        .endr
-        adds    r0, #8 * \s
-        adds    r1, #8 * \s
-        b       1b
-        .irp    k, 7, 6, 5, 4, 3, 2, 1, 0
-.L\w\()StrICmp2_\k:
-        eors    r3, r2
-        cmp     r3, #32
-        bne     .L\w\()StrICmp4_\k
-        orrs    r2, r6
-        subs    r2, #'a'
-        cmp     r2, #25
-        bls     .L\w\()StrICmp3_\k
-.L\w\()StrICmp4_\k:
-        adds    r0, #\k * \s
-        b       5f
-        .endr
-5:      cmp     r3, #0                          @ works for the texts of the benchmark only:
-        beq     6f                              @ they are equal, or the first is the smaller
-        subs    r0, r4, r0
-        .if     \s == 2
-        asrs    r0, r0, #1
-        .endif
-        subs    r0, #1
-        pop     {r4, r5, r6, pc}
-6:      movs    r0, #0
-        pop     {r4, r5, r6, pc}
-
-        function \w\()StrUpper                  @ 8 a small letter, 9 another unit
-        push    {r0, r4, lr}
-        movs    r3, #32
-        movs    r4, #'a'
-1:      .irp    k, 0, 1, 2, 3, 4, 5, 6, 7
-        ldr\x   r1, [r0, #\k * \s]
-        subs    r2, r1, r4
-        cmp     r2, #25
-        bhi     .L\w\()StrUpper2_\k
-        eors    r1, r3
-        str\x   r1, [r0, #\k * \s]
-.L\w\()StrUpper3_\k:
-        .endr
-        adds    r0, #8 * \s
-        b       1b
-        .irp    k, 0, 1, 2, 3, 4, 5, 6, 7
-.L\w\()StrUpper2_\k:
-        cmp     r1, #0
-        bne     .L\w\()StrUpper3_\k
-        pop     {r0, r4, pc}
-        .endr
         .endm
 
         both    , b, 1
         both    W, h, 2
 
-@ The loops that check the count. Their cycles are worked out in bench.cpp, line by line.
-        function selfcheck_branches
+@ What checks the counter: each name ends in the cycles that its lines add up to.
+        function branches_13                    @ branches
         movs    r0, #3                          @ 1
 1:      subs    r0, #1                          @ 1, three times
         bne     1b                              @ 2 + 2 + 1
         b       2f                              @ 2
 2:      bx      lr                              @ 2
 
-        function selfcheck_memory
+        function memory_22                      @ memory
         push    {r4, r5, lr}                    @ 1 + 3
         ldr     r4, [r0]                        @ 2
         strb    r4, [r0, #4]                    @ 2
@@ -180,7 +120,7 @@
         muls    r1, r2                          @ 1
         pop     {r4, r5, pc}                    @ 3 + 3
 
-        function selfcheck_calls
+        function calls_22                       @ calls and what else is rare
         mov     r12, lr                         @ 1
         bl      1f                              @ 3
         adr     r1, 2f                          @ 1
