@@ -1,7 +1,6 @@
-// A device console, the kind that a product has on its serial port: reads command lines, answers
-// them, and lives within fixed buffers.
+// A device console, the kind that a product has on its serial port: reads command lines as they are
+// typed, answers them, and lives within fixed buffers.
 #include <stdio.h>
-#include <unistd.h>
 
 #include "strutil.h"
 
@@ -12,7 +11,9 @@ constexpr int textSize = 16;
 constexpr int nameSize = 8;
 constexpr int maxWords = lineSize / 2;
 
-constexpr char blanks[] = " \t\r\n";
+constexpr char blanks[] = " ";  // a line has no others
+
+enum Key { endOfInput = 4, backspace = 8, deleteKey = 127 };  // Ctrl-D, and the two ways to erase
 
 struct Setting {
   char name[nameSize];
@@ -167,16 +168,36 @@ void fill(char* text) {
   printf("%s\n", filled[settingCount % 2]);
 }
 
+// Reads a whole word as a decimal number, or says why it is none.
+bool readNumber(const char* word, int& value) {
+  const bool negative = *word == '-';
+  const char* digits = word + (negative ? 1 : 0);
+  bool isNumber = *digits != 0;
+  for (const char* at = digits; *at != 0; ++at) isNumber = isNumber && StrChr("0123456789", *at);
+  if (!isNumber) {
+    printf("\"%s\" is no number\n", word);
+    return false;
+  }
+  while (*digits == '0' && digits[1] != 0) ++digits;
+  // What does not fit wraps, and then is written in another way than it was read.
+  value = StrToInt(word);
+  char written[12];
+  IntToStr(value, written, 10);
+  const bool fits =
+      StrCmp(digits, written + (value < 0 ? 1 : 0)) == 0 && (value == 0 || negative == (value < 0));
+  if (!fits) printf("%s does not fit: a number has 32 bits\n", word);
+  return fits;
+}
+
 void number(char* text) {
-  const char* const value = firstWord(text);
-  const int radix = *text == 0 ? 10 : StrToInt(text);
-  if (!StrChr("-0123456789", *value)) {
-    printf("\"%s\" is no number\n", value);
-  } else if (radix < 2 || radix > 36) {
+  int value = 0;
+  int radix = 10;
+  if (!readNumber(firstWord(text), value) || (*text != 0 && !readNumber(text, radix))) return;
+  if (radix < 2 || radix > 36) {
     printf("a radix is 2 to 36\n");
   } else {
     char digits[34];
-    printf("%s\n", IntToStr(StrToInt(value), digits, radix));
+    printf("%s\n", IntToStr(value, digits, radix));
   }
 }
 
@@ -195,6 +216,10 @@ void dump(char* text) {
   BytesToWords(text, raw, count);
   for (int i = 0; i < count; ++i) printf("%04x%s", raw[i], i + 1 < count ? " " : "\n");
 }
+
+bool running = true;
+
+void quit(char*) { running = false; }
 
 void help(char*);
 
@@ -220,12 +245,14 @@ constexpr Command commands[] = {
     {"label", "TEXT", label},
     {"dump", "TEXT", dump},
     {"help", "", help},
+    {"quit", "", quit},
 };
 
 void help(char*) {
   for (const Command& command : commands) {
     printf(*command.arguments == 0 ? "%s\n" : "%s %s\n", command.name, command.arguments);
   }
+  printf("Ctrl-D quits, too\n");
 }
 
 void answer(char* line) {
@@ -246,15 +273,38 @@ void answer(char* line) {
   printf("no command is called \"%s\"; try help\n", name);
 }
 
-// Reads a line, as much of it as `line` holds, and returns its whole length; -1 after the last one.
-int readLine(FILE* input, char* line) {
+// Reads a line as it is typed, shows it, and returns its length; -1 where the input ends. Of a line
+// that is too long, `line` holds, and the other side sees, only what fits.
+int readLine(char* line) {
+  static bool afterReturn = false;
   int length = 0;
-  int c = getc(input);
-  if (c == EOF) return -1;
-  for (; c != EOF && c != '\n'; c = getc(input)) {
-    if (length < lineSize - 1) line[length] = static_cast<char>(c);
-    ++length;
+  for (;;) {
+    const int c = getchar();
+    const bool wasReturn = afterReturn;
+    afterReturn = c == '\r';
+    if (c == EOF || c == endOfInput) {
+      if (length == 0) return -1;
+      break;
+    }
+    if (c == '\n' && wasReturn) continue;
+    if (c == '\r' || c == '\n') break;
+    if (c == backspace || c == deleteKey) {
+      if (length == 0) continue;
+      --length;
+      if (length < lineSize - 1) {
+        // The bytes of one character that follow its first are 128 to 191.
+        while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
+        printf("\b \b");
+      }
+    } else if (c >= ' ' || c == '\t') {
+      if (length < lineSize - 1) {
+        line[length] = static_cast<char>(c == '\t' ? ' ' : c);
+        putchar(line[length]);
+      }
+      ++length;
+    }
   }
+  putchar('\n');
   line[length < lineSize ? length : lineSize - 1] = 0;
   return length;
 }
@@ -262,16 +312,14 @@ int readLine(FILE* input, char* line) {
 }  // namespace
 
 int main() {
-  FILE* const input = fopen("/dev/stdin", "r");
-  if (!input) return 1;
-  const bool typed = isatty(fileno(input)) != 0;
   char line[lineSize];
-  for (;;) {
+  while (running) {
     printf("> ");
-    const int length = readLine(input, line);
-    if (length < 0) break;
-    StrTrim(line, blanks);
-    if (!typed) printf("%s\n", line);
+    const int length = readLine(line);
+    if (length < 0) {
+      printf("\n");
+      break;
+    }
     if (length >= lineSize) {
       printf("%d units are too many: a line has at most %d\n", length, lineSize - 1);
     } else {
