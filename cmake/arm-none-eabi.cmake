@@ -9,3 +9,7 @@ set(CMAKE_TRY_COMPILE_TARGET_TYPE STATIC_LIBRARY)
 
 set(CMAKE_C_FLAGS_INIT "-mcpu=cortex-m0plus -mthumb")
 set(CMAKE_CXX_FLAGS_INIT "-mcpu=cortex-m0plus -mthumb")
+
+# CMake's own choice for Release, -O3, makes firmware larger and hardly faster.
+set(CMAKE_C_FLAGS_RELEASE "-O2 -DNDEBUG" CACHE STRING "Flags of a Release build")
+set(CMAKE_CXX_FLAGS_RELEASE "-O2 -DNDEBUG" CACHE STRING "Flags of a Release build")

@@ -1,10 +1,22 @@
 # cmake --install: the library, its headers in a folder of their own, and what find_package and
 # pkg-config need.
+include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)
-install(TARGETS strutil EXPORT strutil ARCHIVE DESTINATION lib)
-install(DIRECTORY include/ DESTINATION include/strutil)
-install(EXPORT strutil NAMESPACE strutil:: DESTINATION lib/cmake/strutil FILE strutil-config.cmake)
-write_basic_package_version_file(strutil-config-version.cmake COMPATIBILITY SameMajorVersion)
+set(package ${CMAKE_INSTALL_LIBDIR}/cmake/strutil)
+install(TARGETS strutil EXPORT strutil ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR})
+target_include_directories(strutil PUBLIC
+  $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}/strutil>)
+install(DIRECTORY include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/strutil)
+install(EXPORT strutil NAMESPACE strutil:: DESTINATION ${package} FILE strutil-targets.cmake)
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/strutil-config-version.cmake
+  VERSION ${PROJECT_VERSION} COMPATIBILITY SameMajorVersion)
+# The version file goes on to say for which processor this is.
+file(READ ${PROJECT_BINARY_DIR}/strutil-config-version.cmake version)
+configure_file(cmake/processor.cmake.in processor.cmake @ONLY)
+file(READ ${PROJECT_BINARY_DIR}/processor.cmake processor)
+file(WRITE ${PROJECT_BINARY_DIR}/strutil-config-version.cmake "${version}${processor}")
+file(RELATIVE_PATH prefix /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
 configure_file(cmake/strutil.pc.in strutil.pc @ONLY)
-install(FILES ${PROJECT_BINARY_DIR}/strutil-config-version.cmake DESTINATION lib/cmake/strutil)
-install(FILES ${PROJECT_BINARY_DIR}/strutil.pc DESTINATION lib/pkgconfig)
+install(FILES cmake/strutil-config.cmake ${PROJECT_BINARY_DIR}/strutil-config-version.cmake
+  DESTINATION ${package})
+install(FILES ${PROJECT_BINARY_DIR}/strutil.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
