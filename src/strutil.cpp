@@ -44,7 +44,11 @@ extern "C" uint64_t STRUTIL_IDIVMOD(int dividend, int divisor) noexcept;
 #define STRUTIL_ALIASING [[gnu::may_alias]]
 #else
 #define STRUTIL_RARELY(condition) (condition)
-#define STRUTIL_OPAQUE(value)
+#define STRUTIL_OPAQUE(value)               \
+  do {                                      \
+    const volatile unsigned hidden = value; \
+    value = hidden;                         \
+  } while (false)
 #endif
 
 namespace {
