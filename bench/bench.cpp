@@ -328,49 +328,42 @@ class Report {
     return text + (readsPast(row, who) ? " past" : "");
   }
 
-  // Calls what it is given with the sizes of each row, and alignment where it makes a difference.
-  template <typename Cell>
-  void forCells(int from, const Cell& cell) const {
+  // Of each row's cells from a size on, aligned, and misaligned where that makes a difference: what
+  // the build takes, divided by `theirs`, which is 0 where there is nothing to compare with.
+  Ratios compare(const std::string& build, int from,
+                 const std::function<uint64_t(const Row&, int, bool)>& theirs) const {
+    Ratios ratios;
     for (const Row& row : rows) {
       for (const int size : row.sizes) {
-        if (size < from) continue;
-        cell(row, size, true);
-        const bool same = std::all_of(outcomes.begin(), outcomes.end(), [&](const auto& one) {
-          const auto& [title, who, n, aligned] = one.first;
-          return title != row.title() || n != size || one.second == cycles(row, who, n, !aligned);
-        });
-        if (!same) cell(row, size, false);
+        std::pair<uint64_t, uint64_t> before;
+        for (const bool aligned : {true, false}) {
+          const std::pair cell(cycles(row, build, size, aligned), theirs(row, size, aligned));
+          if (size < from || cell.second == 0 || cell == before) continue;
+          before = cell;
+          ratios.add(static_cast<double>(cell.first) / static_cast<double>(cell.second), row, size);
+        }
       }
     }
-  }
-
-  Ratios honest(const std::string& build) const {
-    Ratios ratios;
-    forCells(4, [&](const Row& row, int size, bool aligned) {
-      uint64_t fastest = 0;
-      for (const Image& library : libraries) {
-        const uint64_t theirs = cycles(row, library.file, size, aligned);
-        if (theirs == 0 || readsPast(row, library.file)) continue;
-        if (fastest == 0 || theirs < fastest) fastest = theirs;
-      }
-      if (fastest == 0) return;
-      ratios.add(
-          static_cast<double>(cycles(row, build, size, aligned)) / static_cast<double>(fastest),
-          row, size);
-    });
     return ratios;
   }
 
   Ratios against(const std::string& build, const std::string& who, int from) const {
-    Ratios ratios;
-    forCells(from, [&](const Row& row, int size, bool aligned) {
-      const uint64_t theirs = cycles(row, who, size, aligned);
-      if (theirs == 0) return;
-      ratios.add(
-          static_cast<double>(cycles(row, build, size, aligned)) / static_cast<double>(theirs), row,
-          size);
+    return compare(build, from, [&](const Row& row, int size, bool aligned) {
+      return cycles(row, who, size, aligned);
     });
-    return ratios;
+  }
+
+  // Against the fastest C library that reads nothing past the arguments of the function.
+  Ratios honest(const std::string& build) const {
+    return compare(build, 4, [&](const Row& row, int size, bool aligned) {
+      uint64_t fastest = 0;
+      for (const Image& library : libraries) {
+        const uint64_t one = cycles(row, library.file, size, aligned);
+        if (one == 0 || readsPast(row, library.file)) continue;
+        if (fastest == 0 || one < fastest) fastest = one;
+      }
+      return fastest;
+    });
   }
 
   uint64_t bytesOfFunctions(const std::string& build, const std::set<std::string>& names) const {
