@@ -1,9 +1,9 @@
 // Each operation is written once, as a template on the unit, and the functions of both widths are
 // entries of one line. The templates stand in unnamed namespaces: elsewhere each would leave a
 // symbol of its own in the object.
-#include "strutil.h"
-
 #include <limits.h>
+
+#include "strutil.h"
 
 // The target's division is a routine of the compiler's runtime that gives the quotient and the
 // remainder at once. Called by name: unoptimised builds, and Clang, would call one for each.
@@ -265,7 +265,8 @@ namespace {
 
 // Whether two units that differ are the two cases of a letter.
 STRUTIL_INLINE bool areCases(int a, int b) {
-  return (a ^ b) == caseBit && isLetterFrom('a', static_cast<unsigned>(a | b));
+  if (STRUTIL_RARELY((a ^ b) != caseBit)) return false;
+  return isLetterFrom('a', static_cast<unsigned>(a | b));
 }
 
 template <typename Unit>
@@ -300,8 +301,8 @@ STRUTIL_CORE const Unit* find(const Unit* str, const Unit* substr, bool ignoreCa
     walk(Endless{}, at, rest, [=, &a, &b](int unit, int wanted) {
       a = unit;
       b = wanted;
-      if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(a, b);
-      if (STRUTIL_RARELY(a == 0)) return false;
+      if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(unit, wanted);
+      if (STRUTIL_RARELY(wanted == 0)) return false;
       return true;
     });
     if (b == 0) return str;
@@ -346,8 +347,8 @@ STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, bool i
   const bool stopped = walk(bound, at, str2, [=, &a, &b](int unit1, int unit2) {
     a = unit1;
     b = unit2;
-    if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(a, b);
-    if (STRUTIL_RARELY(a == 0)) return false;
+    if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(unit1, unit2);
+    if (STRUTIL_RARELY(unit2 == 0)) return false;
     return true;
   });
   if (!stopped || a == b) return 0;
@@ -483,18 +484,17 @@ template <typename Unit>
 int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
   const int len_rep = strLen(rep);
-  const int len_with = strLen(with);
+  Unit* tmp = result;
   int length = 0;
-  while (const Unit* const ins = strStr(orig, rep)) {
+  int count = 0;
+  for (; const Unit* const ins = strStr(orig, rep); ++count) {
     const int len_front = static_cast<int>(ins - orig);
-    if (result) {
-      Unit* tmp = copyUnits(result + length, orig, Count{len_front});
-      copyUnits(tmp, with, Endless{});
-    }
-    length += len_front + len_with;
+    if (tmp) tmp = copyUnits(copyUnits(tmp, orig, Count{len_front}), with, Endless{});
+    length += len_front;
     orig = ins + len_rep;
   }
-  if (result) strCopy(result + length, orig);
+  if (count > 0) length += count * strLen(with);
+  if (tmp) strCopy(tmp, orig);
   return length + strLen(orig);
 }
 
@@ -541,7 +541,7 @@ Unit* fromInt(int value, Unit* string, int radix) {
   Unit* end = string;
   do {
     Division by = divide(value, radix);
-    if (STRUTIL_RARELY(value < 0)) by = {-by.quotient, -by.remainder};
+    if (STRUTIL_RARELY(by.quotient < 0)) by = {-by.quotient, -by.remainder};
     *end++ = digitOf<Unit>(static_cast<unsigned>(by.remainder));
     value = by.quotient;
   } while (value != 0);
@@ -586,7 +586,7 @@ int WStrToInt(const WCHAR* string) { return toInt(string); }
 namespace {
 
 template <typename To, typename From>
-STRUTIL_CORE void copyCount(To* des, const From* src, int count) {
+STRUTIL_CORE void copyCount(To*& des, const From*& src, int count) {
   walk(Count{count}, des, src, [](To& to, From from) {
     to = from;
     return true;
@@ -609,7 +609,8 @@ constexpr char emptyText[] = "";
 }  // namespace
 
 void BytesToWords(const char* src, WORD* des, int len) {
-  if (src && des) copyCount(des, units(src), len);
+  const Byte* from = units(src);
+  if (from && des) copyCount(des, from, len);
 }
 
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
@@ -621,11 +622,10 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
 
 char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
   if (!des) return const_cast<char*>(emptyText);
-  Byte* const start = units(des);
-  *start = 0;
-  if (!src || bufsize < 1) return des;
-  Byte* at = start;
-  const auto room = [&] { return bufsize - static_cast<int>(at - start); };  // for a terminator too
+  Byte* at = units(des);
+  const auto room = [&] {  // the terminator's unit included
+    return bufsize - static_cast<int>(at - units(des));
+  };
   unsigned unit = 0;
   const auto copyPrintable = [&](Byte& to, unsigned from) {
     unit = from;
@@ -633,7 +633,8 @@ char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
     to = static_cast<Byte>(unit);
     return true;
   };
-  while (walk(Count{room() - 1}, at, src, copyPrintable) && unit != 0) {
+  if (!src) bufsize = 0;
+  while (bufsize > 0 && walk(Count{room() - 1}, at, src, copyPrintable) && unit != 0) {
     int shift = 12;  // of the first digit
     while (shift > 0 && unit >> shift == 0) shift -= 4;
     if (room() < (shift >> 2) + 7) break;
@@ -653,9 +654,12 @@ void WStrToWords(const WCHAR* src, WORD* des, int len) {
   if (!src || !des || len < 1) return;
 #if defined(STRUTIL_ALIASING)
   if (isAligned(src) && isAligned(des)) {
-    copyCount(static_cast<Pair*>(static_cast<void*>(des)),
-              static_cast<const Pair*>(static_cast<const void*>(src)), len >> 1);
-    if ((len & 1) != 0) des[len - 1] = src[len - 1];
+    Pair* to = static_cast<Pair*>(static_cast<void*>(des));
+    const Pair* from = static_cast<const Pair*>(static_cast<const void*>(src));
+    copyCount(to, from, len >> 1);
+    des = static_cast<WORD*>(static_cast<void*>(to));
+    src = static_cast<const WCHAR*>(static_cast<const void*>(from));
+    if ((len & 1) != 0) *des = *src;
     return;
   }
 #endif
