@@ -222,9 +222,14 @@ class Report {
            "function, and "
         << loops_.mean() << " of the obvious loop. Ours is slower (by the number of units)\n\n"
         << "- than such a library: " << libraries_.list() << ";\n- than the loop: " << loops_.list()
-        << ".\n\nBytes of code: ";
+        << ".\n\nBytes of code, and of stack at most: ";
     for (const Image& build : builds) {
-      out << (build.file == ours ? "" : ", ") << codeSize(build.file) << " by " << build.title;
+      uint32_t stack = 0;
+      for (const auto& [key, function] : functions) {
+        if (key.first == build.file) stack = std::max(stack, function.stack);
+      }
+      out << (build.file == ours ? "" : "; ") << build.title << " " << codeSize(build.file)
+          << " and " << stack;
     }
     out << ".\n";
   }
