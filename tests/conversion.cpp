@@ -12,7 +12,8 @@ TEST_CASE_TEMPLATE("IntToStr writes every value in every radix", Unit, char, WCH
   for (int power = 1; power < 1000000000; power *= 10) {
     values.insert(values.end(), {power, power - 1, -power, 1 - power});
   }
-  const int radices[] = {INT_MIN, -3, 0, 1, 2, 3, 8, 10, 16, 36, 37, 170, 1000, 70000, INT_MAX};
+  std::vector<int> radices = {INT_MIN, -3, 170, 1000, 70000, INT_MAX - 1, INT_MAX};
+  for (int radix = 0; radix < 42; ++radix) radices.push_back(radix);
   for (const int value : values) {
     for (const int radix : radices) {
       checkFromInt<Unit>(value, radix);

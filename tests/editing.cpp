@@ -5,11 +5,11 @@ namespace {
 const std::vector<Units> texts = allTexts(u"a,;\u00e9", 4);
 const std::vector<Units> sets = {u"", u",", u",;", u";,;,", u"\u00e9", u"\u00e9a;,"};
 
-// Tokens of every length up to 15 and as many as that, between runs of all units of a set of 6.
+// Tokens of every length up to 24 and as many as that, between runs of all units of a set of 6.
 const Units manySet = u",; .\u00fe\t";
 Units manyTokens() {
   Units line;
-  for (size_t i = 0; i < 16; ++i) {
+  for (size_t i = 0; i < 25; ++i) {
     line += manySet.substr(i % 6) + manySet.substr(0, i % 4) + longText(i);
   }
   return line + manySet + manySet;
@@ -64,6 +64,9 @@ TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char
   }
   checkTrim<Unit>(manyTokens(), manySet);
   checkTrim<Unit>(manySet + manySet + manySet, manySet);
+  for (size_t length = 5; length < 300; length += length < 25 ? 1 : 91) {
+    checkTrim<Unit>(manySet + longText(length) + manySet, manySet);
+  }
 }
 
 TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {

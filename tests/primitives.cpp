@@ -124,6 +124,7 @@ TEST_CASE_TEMPLATE("StrCat, StrCatBuf and the wide appends add what the bounds a
   }
   for (const int bound : {12, 13, 16, 20, 21, 22, 255, 256, 257, 258, 277, 278, 279, 280}) {
     checkAppends<Unit>(longText(21), longText(257), bound, INT_MAX);
+    checkAppends<Unit>(longText(21), longText(257), INT_MAX, bound);
     checkAppends<Unit>(longText(257), longText(21), INT_MAX, bound);
   }
 }
