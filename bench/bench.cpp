@@ -164,10 +164,19 @@ class Ratios {
 
 // What a build's function was seen to take at most, all its rows together.
 struct Seen {
-  double fixed = 0;  // cycles, as a formula of the units
-  double each = 0;
+  std::map<int, uint64_t> cycles;  // by the units
+  double each = 0;                 // more of them a unit, of the row that grows fastest
   uint32_t stack = 0;
   std::set<std::string> parts;  // the functions that ran
+
+  // What remains for all that was seen to stay within a formula of the units.
+  double fixed() const {
+    double most = 0;
+    for (const auto& [size, count] : cycles) {
+      most = std::max(most, std::ceil(static_cast<double>(count) - (each * size)));
+    }
+    return most;
+  }
 };
 
 class Report {
@@ -213,15 +222,16 @@ class Report {
       for (const Image& library : libraries) out << " | " << ratio(*row, library.file, 256);
       out << " | " << ratio(*row, loop, 256) << " |\n";
     }
-    const Ratios libraries_ = honest(ours);
-    const Ratios loops_ = against(ours, loop, 4);
+    const Ratios besideLibraries = honest(ours);
+    const Ratios besideLoop = against(ours, loop, 4);
     out << "\nOur cycles divided by theirs, so that below 1 ours is faster; \"past\": theirs reads "
            "past its argument. Over all\ncells from 4 units on, in the geometric mean: "
-        << libraries_.mean()
+        << besideLibraries.mean()
         << " of the fastest C library that reads nothing past\nthe end, where a C library has the "
            "function, and "
-        << loops_.mean() << " of the obvious loop. Ours is slower (by the number of units)\n\n"
-        << "- than such a library: " << libraries_.list() << ";\n- than the loop: " << loops_.list()
+        << besideLoop.mean() << " of the obvious loop. Ours is slower (by the number of units)\n\n"
+        << "- than such a library: " << besideLibraries.list()
+        << ";\n- than the loop: " << besideLoop.list()
         << ".\n\nBytes of code, and of stack at most: ";
     for (const Image& build : builds) {
       uint32_t stack = 0;
@@ -266,7 +276,6 @@ class Report {
     std::vector<int> sizes = row.sizes;
     // Ours also at every length of a turn, so that the formula holds for all.
     if (isOurs && sizes.back() == 256) sizes.insert(sizes.end(), {5, 6, 7, 8, 65, 253, 254, 255});
-    std::map<int, uint64_t> seen;
     for (const int size : sizes) {
       for (const bool aligned : {true, false}) {
         const std::string where = who + " " + row.title() + " " + std::to_string(size);
@@ -283,29 +292,16 @@ class Report {
         most.stack = std::max(most.stack, run.stack);
         most.parts.insert(run.functions.begin(), run.functions.end());
         if (who == ours && most.stack > mostStack) fail(where, "uses more stack than promised");
-        seen[size] = std::max(seen[size], run.cycles);
+        most.cycles[size] = std::max(most.cycles[size], run.cycles);
       }
     }
-    if (isOurs) addFormula(functions[{who, row.name}], row.sizes, seen);
-  }
-
-  // The slope between the last two sizes, rounded up, and what it takes to cover all that was seen.
-  static void addFormula(Seen& function, const std::vector<int>& sizes,
-                         const std::map<int, uint64_t>& seen) {
-    double each = 0;
-    if (sizes.size() > 1) {
-      const int from = sizes[sizes.size() - 2];
-      const int to = sizes.back();
-      const double slope = static_cast<double>(seen.at(to) - seen.at(from)) / (to - from);
-      each = std::ceil(slope * 100) / 100;
-    }
-    double fixed = 0;
-    for (const auto& [size, cycles] : seen) {
-      fixed = std::max(fixed, std::ceil(static_cast<double>(cycles) - each * size));
-    }
-    if (std::pair(each, fixed) > std::pair(function.each, function.fixed)) {
-      function.each = each;
-      function.fixed = fixed;
+    if (!isOurs || row.sizes.size() < 2) return;
+    const int from = row.sizes[row.sizes.size() - 2];
+    const int to = row.sizes.back();
+    double& each = functions[{who, row.name}].each;
+    for (const bool aligned : {true, false}) {
+      const uint64_t more = cycles(row, who, to, aligned) - cycles(row, who, from, aligned);
+      each = std::max(each, std::ceil(static_cast<double>(more) * 100 / (to - from)) / 100);
     }
   }
 
@@ -435,7 +431,7 @@ class Report {
       }
       const Seen& function = functions.at({build.file, row.name});
       if (shown.insert(row.name).second) {
-        out << " " << format("%.0f", function.fixed);
+        out << " " << format("%.0f", function.fixed());
         if (function.each > 0) out << " + " << format("%.2f", function.each) << " n";
         out << " | " << bytesOfFunctions(build.file, function.parts) << " | " << function.stack;
       } else {
