@@ -1,9 +1,9 @@
 // Each operation is written once, as a template on the unit, and the functions of both widths are
 // entries of one line. The templates stand in unnamed namespaces: elsewhere each would leave a
 // symbol of its own in the object.
-#include <limits.h>
-
 #include "strutil.h"
+
+#include <limits.h>
 
 // The target's division is a routine of the compiler's runtime that gives the quotient and the
 // remainder at once. Called by name: unoptimised builds, and Clang, would call one for each.
