@@ -12,9 +12,9 @@
 extern "C" uint64_t STRUTIL_IDIVMOD(int dividend, int divisor) noexcept;
 #endif
 
-// What is particular to compilers. The module is right without any of it. It keeps calls that the
-// compilers invent out of the object, whatever the user's options, and it says what options cannot
-// be asked of every user: how loops over units come out fast on a Cortex-M0+.
+// What is particular to compilers, with what serves any other beside it. It keeps calls that they
+// invent out of the object, whatever the user's options, and it says what options cannot be asked
+// of every user: how loops over units come out fast on a Cortex-M0+.
 #if defined(__clang__)
 // Clang without minsize repeats every small loop four times, and inlines each function called.
 #pragma clang attribute push
