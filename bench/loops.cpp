@@ -172,80 +172,84 @@ void toWords(const Unit* src, WORD* des, int len) {
 
 }  // namespace
 
-int StrLen(const char* str) { return length(str); }
-int WStrLen(const WCHAR* str) { return length(str); }
-int CharToLower(const int c) { return c >= 'A' && c <= 'Z' ? c + 32 : c; }
-int CharToUpper(const int c) { return c >= 'a' && c <= 'z' ? c - 32 : c; }
-char* StrUpper(char* str) { return change<char>(str, 'a', 'z', -32); }
-WCHAR* WStrUpper(WCHAR* str) { return change<WCHAR>(str, 'a', 'z', -32); }
-char* StrLower(char* str) { return change<char>(str, 'A', 'Z', 32); }
-WCHAR* WStrLower(WCHAR* str) { return change<WCHAR>(str, 'A', 'Z', 32); }
+int StrLen(const char* str) noexcept { return length(str); }
+int WStrLen(const WCHAR* str) noexcept { return length(str); }
+int CharToLower(const int c) noexcept { return c >= 'A' && c <= 'Z' ? c + 32 : c; }
+int CharToUpper(const int c) noexcept { return c >= 'a' && c <= 'z' ? c - 32 : c; }
+char* StrUpper(char* str) noexcept { return change<char>(str, 'a', 'z', -32); }
+WCHAR* WStrUpper(WCHAR* str) noexcept { return change<WCHAR>(str, 'a', 'z', -32); }
+char* StrLower(char* str) noexcept { return change<char>(str, 'A', 'Z', 32); }
+WCHAR* WStrLower(WCHAR* str) noexcept { return change<WCHAR>(str, 'A', 'Z', 32); }
 
-void StrCopy(char* dst, const char* src) { copy(dst, src); }
-void WStrCopy(WCHAR* dst, const WCHAR* src) { copy(dst, src); }
-void StrCopyBuf(char* dst, int n, const char* src) { copyBuf(dst, n, src); }
-void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) { copyBuf(dst, n, src); }
-void StrNCopy(char* dst, const char* src, int n) { nCopy(dst, src, n); }
-void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) { nCopy(dst, src, n); }
+void StrCopy(char* dst, const char* src) noexcept { copy(dst, src); }
+void WStrCopy(WCHAR* dst, const WCHAR* src) noexcept { copy(dst, src); }
+void StrCopyBuf(char* dst, int n, const char* src) noexcept { copyBuf(dst, n, src); }
+void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) noexcept { copyBuf(dst, n, src); }
+void StrNCopy(char* dst, const char* src, int n) noexcept { nCopy(dst, src, n); }
+void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) noexcept { nCopy(dst, src, n); }
 
-void StrCat(char* dst, const char* src) { copy(end(dst), src); }
-void WStrCat(WCHAR* dst, const WCHAR* src) { copy(end(dst), src); }
-void StrCatBuf(char* dst, int n, const char* src) {
+void StrCat(char* dst, const char* src) noexcept { copy(end(dst), src); }
+void WStrCat(WCHAR* dst, const WCHAR* src) noexcept { copy(end(dst), src); }
+void StrCatBuf(char* dst, int n, const char* src) noexcept {
   const int off = length(dst);
   copyBuf(dst + off, n - off, src);
 }
-void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) {
+void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) noexcept {
   const int off = length(dst);
   copyBuf(dst + off, n - off, src);
 }
-void WStrNCat(WCHAR* dst, const WCHAR* src, int num) { copyBuf(end(dst), num + 1, src); }
-void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) {
+void WStrNCat(WCHAR* dst, const WCHAR* src, int num) noexcept { copyBuf(end(dst), num + 1, src); }
+void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) noexcept {
   const int room = n - length(dst);
   copyBuf(end(dst), num + 1 < room ? num + 1 : room, src);
 }
 
-char* StrChr(const char* str, const char c) { return chr(str, c); }
-WCHAR* WStrChr(const WCHAR* str, const WCHAR c) { return chr(str, c); }
-char* StrStr(const char* str, const char* substr) { return find<same>(str, substr); }
-WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) { return find<same>(str, substr); }
-char* StrIStr(const char* str, const char* substr) { return find<lower>(str, substr); }
-WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) { return find<lower>(str, substr); }
+char* StrChr(const char* str, const char c) noexcept { return chr(str, c); }
+WCHAR* WStrChr(const WCHAR* str, const WCHAR c) noexcept { return chr(str, c); }
+char* StrStr(const char* str, const char* substr) noexcept { return find<same>(str, substr); }
+WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) noexcept { return find<same>(str, substr); }
+char* StrIStr(const char* str, const char* substr) noexcept { return find<lower>(str, substr); }
+WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept { return find<lower>(str, substr); }
 
-int StrNCmp(const char* a, const char* b, int n) { return nCompare<same>(a, b, n); }
-int WStrNCmp(const WCHAR* a, const WCHAR* b, int n) { return nCompare<same>(a, b, n); }
-int StrNICmp(const char* a, const char* b, int n) { return nCompare<lower>(a, b, n); }
-int WStrNICmp(const WCHAR* a, const WCHAR* b, int n) { return nCompare<lower>(a, b, n); }
-int StrCmp(const char* a, const char* b) { return compare<same>(a, b); }
-int WStrCmp(const WCHAR* a, const WCHAR* b) { return compare<same>(a, b); }
-int StrICmp(const char* a, const char* b) { return compare<lower>(a, b); }
-int WStrICmp(const WCHAR* a, const WCHAR* b) { return compare<lower>(a, b); }
+int StrNCmp(const char* a, const char* b, int n) noexcept { return nCompare<same>(a, b, n); }
+int WStrNCmp(const WCHAR* a, const WCHAR* b, int n) noexcept { return nCompare<same>(a, b, n); }
+int StrNICmp(const char* a, const char* b, int n) noexcept { return nCompare<lower>(a, b, n); }
+int WStrNICmp(const WCHAR* a, const WCHAR* b, int n) noexcept { return nCompare<lower>(a, b, n); }
+int StrCmp(const char* a, const char* b) noexcept { return compare<same>(a, b); }
+int WStrCmp(const WCHAR* a, const WCHAR* b) noexcept { return compare<same>(a, b); }
+int StrICmp(const char* a, const char* b) noexcept { return compare<lower>(a, b); }
+int WStrICmp(const WCHAR* a, const WCHAR* b) noexcept { return compare<lower>(a, b); }
 
-char* StrToken(char* str, int* off, const char* dlmt) { return token(str, off, dlmt); }
-WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) { return token(str, off, dlmt); }
-int StrSplit(char* str, const char* dlmt, char** wrd) { return split(str, dlmt, wrd); }
-int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dlmt, wrd); }
-int StrTrim(char* str, const char* trimSet) { return trim(str, trimSet); }
-int WStrTrim(WCHAR* str, const WCHAR* trimSet) { return trim(str, trimSet); }
+char* StrToken(char* str, int* off, const char* dlmt) noexcept { return token(str, off, dlmt); }
+WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }
+int StrSplit(char* str, const char* dlmt, char** wrd) noexcept { return split(str, dlmt, wrd); }
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept { return split(str, dlmt, wrd); }
+int StrTrim(char* str, const char* trimSet) noexcept { return trim(str, trimSet); }
+int WStrTrim(WCHAR* str, const WCHAR* trimSet) noexcept { return trim(str, trimSet); }
 
-int StrReplace(const char* orig, const char* rep, const char* with, char* result) {
+int StrReplace(const char* orig, const char* rep, const char* with, char* result) noexcept {
   return replace(orig, rep, with, result);
 }
-int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) {
+int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) noexcept {
   return replace(orig, rep, with, result);
 }
 
-char* IntToStr(int value, char* string, int radix) { return fromInt(value, string, radix); }
-WCHAR* IntToWStr(int value, WCHAR* string, int radix) { return fromInt(value, string, radix); }
-int StrToInt(const char* string) { return toInt(string); }
-int WStrToInt(const WCHAR* string) { return toInt(string); }
+char* IntToStr(int value, char* string, int radix) noexcept {
+  return fromInt(value, string, radix);
+}
+WCHAR* IntToWStr(int value, WCHAR* string, int radix) noexcept {
+  return fromInt(value, string, radix);
+}
+int StrToInt(const char* string) noexcept { return toInt(string); }
+int WStrToInt(const WCHAR* string) noexcept { return toInt(string); }
 
-void BytesToWords(const char* src, WORD* des, int len) { toWords(src, des, len); }
-void WStrToWords(const WCHAR* src, WORD* des, int len) { toWords(src, des, len); }
-WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
+void BytesToWords(const char* src, WORD* des, int len) noexcept { toWords(src, des, len); }
+void WStrToWords(const WCHAR* src, WORD* des, int len) noexcept { toWords(src, des, len); }
+WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) noexcept {
   copyBuf(des, bufsize, src);
   return des;
 }
-char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
+char* WStrToStr(const WCHAR* src, char* des, int bufsize) noexcept {
   int i = 0;
   for (; *src != 0; src++) {
     if (*src >= ' ' && *src <= '~') {

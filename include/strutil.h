@@ -3,10 +3,10 @@
  * strutil: text for small firmware. 50 functions that measure, copy, join, search, compare,
  * tokenize, trim, replace and convert zero-terminated text of 8-bit and of 16-bit units.
  *
- * No function allocates, keeps state or calls the C library. None reads a unit after a terminator
- * or past a given count, and none writes a unit that its contract does not name. A null pointer
- * is an ordinary argument with a stated result. Errors have no result of their own: they give the
- * null, 0 or empty text that an ordinary argument can give as well.
+ * No function allocates, keeps state, throws or calls the C library. None reads a unit after a
+ * terminator or past a given count, and none writes a unit that its contract does not name. A null
+ * pointer is an ordinary argument with a stated result. Errors have no result of their own: they
+ * give the null, 0 or empty text that an ordinary argument can give as well.
  *
  * The words used below:
  * - unit: one element of a text, a `char` (narrow) or a `WCHAR` (wide). Units are unsigned, 0 to
@@ -45,39 +45,42 @@
 #include "base_types.h"
 
 #ifdef __cplusplus
+#define STRUTIL_NOEXCEPT noexcept
 extern "C" {
+#else
+#define STRUTIL_NOEXCEPT
 #endif
 
 /** @name Lengths and case mapping */
 /**@{*/
 
 /** Returns the length of `str`; 0 if it is null. */
-int StrLen(const char* str);
+int StrLen(const char* str) STRUTIL_NOEXCEPT;
 /** Wide twin of StrLen(): counts units, not bytes. */
-int WStrLen(const WCHAR* str);
+int WStrLen(const WCHAR* str) STRUTIL_NOEXCEPT;
 
 /** Returns `c` + 32 if `c` is "A" to "Z", else `c`: any int is allowed, units of both widths too.
  */
-int CharToLower(const int c);
+int CharToLower(const int c) STRUTIL_NOEXCEPT;
 /** Returns `c` - 32 if `c` is "a" to "z", else `c`: any int is allowed, units of both widths too.
  */
-int CharToUpper(const int c);
+int CharToUpper(const int c) STRUTIL_NOEXCEPT;
 
 /**
  * Turns the small letters of `str` into capitals in place and returns `str`; null if it is null.
  * Only the units that change are written: a text without a small letter may be read-only.
  */
-char* StrUpper(char* str);
+char* StrUpper(char* str) STRUTIL_NOEXCEPT;
 /** Wide twin of StrUpper(). */
-WCHAR* WStrUpper(WCHAR* str);
+WCHAR* WStrUpper(WCHAR* str) STRUTIL_NOEXCEPT;
 
 /**
  * Turns the capital letters of `str` into small ones in place and returns `str`; null if it is
  * null. Only the units that change are written: a text without a capital may be read-only.
  */
-char* StrLower(char* str);
+char* StrLower(char* str) STRUTIL_NOEXCEPT;
 /** Wide twin of StrLower(). */
-WCHAR* WStrLower(WCHAR* str);
+WCHAR* WStrLower(WCHAR* str) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -91,27 +94,27 @@ WCHAR* WStrLower(WCHAR* str);
 /**@{*/
 
 /** Copies `src` and its terminator to `dst`, which has room for the length of `src` + 1 units. */
-void StrCopy(char* dst, const char* src);
+void StrCopy(char* dst, const char* src) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCopy(). */
-void WStrCopy(WCHAR* dst, const WCHAR* src);
+void WStrCopy(WCHAR* dst, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Copies as much of `src` as fits into the capacity `n` of `dst`: at most `n` - 1 units, then the
  * terminator; the units after it are left as they were. With `n` below 1 nothing is written, not
  * even for a null `src`. A cut is not reported: compare the lengths where it matters.
  */
-void StrCopyBuf(char* dst, int n, const char* src);
+void StrCopyBuf(char* dst, int n, const char* src) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCopyBuf(). */
-void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src);
+void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Copies at most `n` units of `src`, its terminator counted. It ends after the terminator, without
  * filling up to `n`, or after `n` units: if the length of `src` is `n` or more, `dst` is left
  * unterminated. Nothing of `src` past these units is read. With `n` below 1, `dst` is emptied.
  */
-void StrNCopy(char* dst, const char* src, int n);
+void StrNCopy(char* dst, const char* src, int n) STRUTIL_NOEXCEPT;
 /** Wide twin of StrNCopy(). */
-void WStrNCopy(WCHAR* dst, const WCHAR* src, int n);
+void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -124,30 +127,31 @@ void WStrNCopy(WCHAR* dst, const WCHAR* src, int n);
 /**@{*/
 
 /** Appends all of `src`; `dst` has room for both lengths + 1 units. */
-void StrCat(char* dst, const char* src);
+void StrCat(char* dst, const char* src) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCat(). */
-void WStrCat(WCHAR* dst, const WCHAR* src);
+void WStrCat(WCHAR* dst, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Appends as much of `src` as fits into the capacity `n` of the whole buffer `dst`, old text
  * included. If that leaves no room for a unit more, nothing is written: an old text that is too
- * long already is not cut. A cut is not reported.
+ * long already is not cut. A cut is not reported. `n` does not bound the search for the end of the
+ * old text: `dst` holds a terminator, within `n` or not.
  */
-void StrCatBuf(char* dst, int n, const char* src);
+void StrCatBuf(char* dst, int n, const char* src) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCatBuf(). */
-void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src);
+void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Appends at most `num` units of `src` and reads no more than these; with `num` below 1 the text
  * stays as it is. `dst` has room for its text, the units appended and the terminator. Wide only.
  */
-void WStrNCat(WCHAR* dst, const WCHAR* src, int num);
+void WStrNCat(WCHAR* dst, const WCHAR* src, int num) STRUTIL_NOEXCEPT;
 
 /**
  * Appends at most `num` units of `src`, and no more than WStrCatBuf() with `n` would; with `num`
  * below 1 the text stays as it is. Wide only.
  */
-void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num);
+void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -159,19 +163,19 @@ void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num);
 /**@{*/
 
 /** Finds the unit `c` in `str`. The terminator is never found: `c` = 0 gives null. */
-char* StrChr(const char* str, const char c);
+char* StrChr(const char* str, const char c) STRUTIL_NOEXCEPT;
 /** Wide twin of StrChr(). */
-WCHAR* WStrChr(const WCHAR* str, const WCHAR c);
+WCHAR* WStrChr(const WCHAR* str, const WCHAR c) STRUTIL_NOEXCEPT;
 
 /** Finds `substr` in `str`. An empty `substr` is found at once, unless `str` is empty too. */
-char* StrStr(const char* str, const char* substr);
+char* StrStr(const char* str, const char* substr) STRUTIL_NOEXCEPT;
 /** Wide twin of StrStr(). */
-WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr);
+WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) STRUTIL_NOEXCEPT;
 
 /** StrStr() with capital and small letters taken as equal. */
-char* StrIStr(const char* str, const char* substr);
+char* StrIStr(const char* str, const char* substr) STRUTIL_NOEXCEPT;
 /** Wide twin of StrIStr(). */
-WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr);
+WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -190,28 +194,28 @@ WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr);
 /**@{*/
 
 /** Compares at most `n` units. */
-int StrNCmp(const char* str1, const char* str2, int n);
+int StrNCmp(const char* str1, const char* str2, int n) STRUTIL_NOEXCEPT;
 /** Wide twin of StrNCmp(). */
-int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n);
+int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) STRUTIL_NOEXCEPT;
 
 /**
  * Compares at most `n` units without regard to case. Irregular: texts that differ always give
  * -(i + 1), whichever is the larger, so the result orders nothing; 1 is still given if only `str2`
  * is null.
  */
-int StrNICmp(const char* str1, const char* str2, int n);
+int StrNICmp(const char* str1, const char* str2, int n) STRUTIL_NOEXCEPT;
 /** Compares at most `n` units without regard to case. Not irregular as StrNICmp() is: i + 1 too. */
-int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n);
+int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) STRUTIL_NOEXCEPT;
 
 /** Compares two texts. */
-int StrCmp(const char* str1, const char* str2);
+int StrCmp(const char* str1, const char* str2) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCmp(). */
-int WStrCmp(const WCHAR* str1, const WCHAR* str2);
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) STRUTIL_NOEXCEPT;
 
 /** Compares two texts without regard to case. */
-int StrICmp(const char* str1, const char* str2);
+int StrICmp(const char* str1, const char* str2) STRUTIL_NOEXCEPT;
 /** Wide twin of StrICmp(). */
-int WStrICmp(const WCHAR* str1, const WCHAR* str2);
+int WStrICmp(const WCHAR* str1, const WCHAR* str2) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -235,18 +239,18 @@ int WStrICmp(const WCHAR* str1, const WCHAR* str2);
  * A walk's state is `*off` alone, so walks over different texts may alternate, and each call may
  * pass another `dlmt`.
  */
-char* StrToken(char* str, int* off, const char* dlmt);
+char* StrToken(char* str, int* off, const char* dlmt) STRUTIL_NOEXCEPT;
 /** Wide twin of StrToken(). */
-WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt);
+WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) STRUTIL_NOEXCEPT;
 
 /**
  * Cuts `str` into all its tokens, stores a pointer to each in `wrd`, and returns their number; 0
  * if an argument is null. Entries past that number are not written. `wrd` has room for all tokens:
  * (length + 1) / 2 entries always suffice, too few are not detected.
  */
-int StrSplit(char* str, const char* dlmt, char** wrd);
+int StrSplit(char* str, const char* dlmt, char** wrd) STRUTIL_NOEXCEPT;
 /** Wide twin of StrSplit(). */
-int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd);
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -259,9 +263,9 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd);
  * terminator are left as they are. The terminator is written again even if nothing is removed, so
  * `str` must be writable. A null or empty `trimSet` removes nothing; a null `str` gives 0.
  */
-int StrTrim(char* str, const char* trimSet);
+int StrTrim(char* str, const char* trimSet) STRUTIL_NOEXCEPT;
 /** Wide twin of StrTrim(). */
-int WStrTrim(WCHAR* str, const WCHAR* trimSet);
+int WStrTrim(WCHAR* str, const WCHAR* trimSet) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -281,9 +285,10 @@ int WStrTrim(WCHAR* str, const WCHAR* trimSet);
  * If `orig`, `rep` or `with` is null or `rep` is empty, the result is 0 and nothing is written, not
  * even a terminator.
  */
-int StrReplace(const char* orig, const char* rep, const char* with, char* result);
+int StrReplace(const char* orig, const char* rep, const char* with, char* result) STRUTIL_NOEXCEPT;
 /** Wide twin of StrReplace(). */
-int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result);
+int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with,
+                WCHAR* result) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -294,15 +299,15 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* r
  * Writes the text of `value` in `radix` to `string` and returns `string`; null if it is null. The
  * text is a "-" if the value is negative, then its digits without leading zeros: "0" to "9", then
  * "a" to "z", then the units that follow "z" for digits above 35, of which 8 or 16 bits are kept.
- * It takes, with its terminator, at most 34 units in radix 2 and in any other, 13 in radix 8, 12 in
- * radix 10, 10 in radix 16 and 8 in radix 36; nothing after it is written.
+ * 34 units hold every text with its terminator; 13 do in radix 8, 12 in radix 10, 10 in radix 16
+ * and 8 in radix 36. Nothing after the terminator is written.
  *
  * Every value is written so, the most negative one included. A radix below 1 gives the empty text.
  * Radix 1 writes 0 as "0" and gives the empty text for every other value.
  */
-char* IntToStr(int value, char* string, int radix);
+char* IntToStr(int value, char* string, int radix) STRUTIL_NOEXCEPT;
 /** Wide twin of IntToStr(). */
-WCHAR* IntToWStr(int value, WCHAR* string, int radix);
+WCHAR* IntToWStr(int value, WCHAR* string, int radix) STRUTIL_NOEXCEPT;
 
 /**
  * Returns the decimal integer at the start of `string`: spaces and tabs, an optional "-", digits.
@@ -310,9 +315,9 @@ WCHAR* IntToWStr(int value, WCHAR* string, int radix);
  * begin so gives 0, a "+" or a space after the "-" included, and so does null. A value too large
  * for an int is not detected: it wraps modulo 2^32.
  */
-int StrToInt(const char* string);
+int StrToInt(const char* string) STRUTIL_NOEXCEPT;
 /** Wide twin of StrToInt(). */
-int WStrToInt(const WCHAR* string);
+int WStrToInt(const WCHAR* string) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
@@ -324,7 +329,7 @@ int WStrToInt(const WCHAR* string);
  * positive. No terminator is looked for or written. With a null pointer or `len` below 1, nothing
  * is written. The copy runs forward, one unit after the other, also where the arrays overlap.
  */
-void BytesToWords(const char* src, WORD* des, int len);
+void BytesToWords(const char* src, WORD* des, int len) STRUTIL_NOEXCEPT;
 
 /**
  * Widens as much of `src` as fits into the capacity `bufsize` of `des`, at most `bufsize` - 1
@@ -332,7 +337,7 @@ void BytesToWords(const char* src, WORD* des, int len);
  * So does a `bufsize` below 2, 0 and negative ones included: `des` must have room for one unit in
  * any case. A cut is not reported.
  */
-WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize);
+WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) STRUTIL_NOEXCEPT;
 
 /**
  * Writes `src` as printable text to `des`, within its capacity `bufsize`, and returns `des`. The
@@ -344,17 +349,19 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize);
  * A null `src` empties `des`. A `bufsize` below 1 is taken as 1: `des` must have room for one unit
  * in any case. A null `des` gives a constant empty text, which must not be written to.
  */
-char* WStrToStr(const WCHAR* src, char* des, int bufsize);
+char* WStrToStr(const WCHAR* src, char* des, int bufsize) STRUTIL_NOEXCEPT;
 
 /**
  * Copies `len` units of `src` to `des`. No terminator is looked for or written. With a null
- * pointer or `len` below 1, nothing is written. The copy runs forward, one unit after the other,
- * also where the arrays overlap.
+ * pointer or `len` below 1, nothing is written. The copy runs forward as if unit by unit, also
+ * where the arrays overlap; it moves 32 bits at a time where both are aligned to 4, so neither may
+ * be memory that takes accesses of 16 bits only.
  */
-void WStrToWords(const WCHAR* src, WORD* des, int len);
+void WStrToWords(const WCHAR* src, WORD* des, int len) STRUTIL_NOEXCEPT;
 
 /**@}*/
 
+#undef STRUTIL_NOEXCEPT
 #ifdef __cplusplus
 }
 #endif

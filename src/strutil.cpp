@@ -1,54 +1,61 @@
-// Each operation is written once, as a template on the unit, and the functions of both widths are
-// entries of one line. The templates stand in unnamed namespaces: elsewhere each would leave a
-// symbol of its own in the object.
+// Each operation is written once, as a template on the unit, for both widths: first all of these,
+// by family, then the functions of the library, of one line each. The templates stand in an unnamed
+// namespace: elsewhere each would leave a symbol of its own in the object.
 #include "strutil.h"
 
 #include <limits.h>
 
 // The target's division is a routine of the compiler's runtime that gives the quotient and the
-// remainder at once. Called by name: unoptimised builds, and Clang, would call one for each.
+// remainder at once. Called by name: unoptimised builds, and Clang, would call one for each. It is
+// declared before what follows, since Clang puts no_builtin on definitions only.
 #if defined(__ARM_EABI__) && !defined(__ARM_FEATURE_IDIV) && !defined(__ARM_BIG_ENDIAN)
 #define STRUTIL_IDIVMOD __aeabi_idivmod
 extern "C" uint64_t STRUTIL_IDIVMOD(int dividend, int divisor) noexcept;
 #endif
 
-// What is particular to compilers, with what serves any other beside it. It keeps calls that they
-// invent out of the object, whatever the user's options, and it says what options cannot be asked
-// of every user: how loops over units come out fast on a Cortex-M0+.
+// Keeps compilers from inventing library calls, and sets what makes these loops fast and small: no
+// user's flags can be relied on.
 #if defined(__clang__)
-// Clang without minsize repeats every small loop four times, and inlines each function called.
 #pragma clang attribute push
 #pragma clang attribute(__attribute__((no_builtin)), apply_to = function)
 #pragma clang attribute(__attribute__((no_stack_protector)), apply_to = function)
+// Else tables for unwinding refer to the C++ runtime, and every small loop is repeated four times.
 #pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))
 #pragma clang attribute(__attribute__((minsize)), apply_to = function)
 #elif defined(__GNUC__)
-// GCC's -ftree-pre, -fivopts, -ftree-scev-cprop and -fpartial-inlining keep more values than the
-// core has low registers, work out after a loop what the loop knew, or put a call before it.
 #pragma GCC push_options
-#pragma GCC optimize("no-tree-loop-distribute-patterns", "no-tree-vectorize", "no-stack-protector")
-#pragma GCC optimize("no-tree-pre", "no-ivopts", "no-tree-scev-cprop", "no-partial-inlining")
+// What else puts calls of the C library, or constant data, into the object.
+#pragma GCC optimize("no-stack-protector", "no-tree-loop-optimize", "no-tree-slp-vectorize")
+#if __GNUC__ >= 12
+#pragma GCC optimize("trivial-auto-var-init=uninitialized")
+#endif
+// Wrong code: a caller keeps values in r1 to r3, and the called function pops its frame into them.
+#pragma GCC optimize("no-ipa-ra")
+// These keep more values than the core has low registers. The last puts a call before a loop.
+#pragma GCC optimize("no-tree-pre", "no-move-loop-invariants", "no-schedule-insns")
+#pragma GCC optimize("no-schedule-insns2", "no-if-conversion", "no-partial-inlining")
 #endif
 
 #if defined(__clang__)
 #define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // minsize inlines no lambda
 #elif defined(__GNUC__)
 #define STRUTIL_INLINE [[gnu::always_inline]] inline
-#else
-#define STRUTIL_INLINE inline
 #endif
-
 #if defined(__clang__) || defined(__GNUC__)
 #define STRUTIL_RARELY(condition) __builtin_expect(!!(condition), 0)
 #define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides where the value comes from
 #define STRUTIL_ALIASING [[gnu::may_alias]]
 #else
+#define STRUTIL_INLINE inline
 #define STRUTIL_RARELY(condition) (condition)
-#define STRUTIL_OPAQUE(value)               \
-  do {                                      \
-    const volatile unsigned hidden = value; \
-    value = hidden;                         \
-  } while (false)
+#define STRUTIL_OPAQUE(value) value = const_cast<const volatile unsigned&>(value)
+#endif
+
+// Puts a value that a loop does without into r12, which costs no push and no pop.
+#if defined(__thumb__) && !defined(__thumb2__) && !defined(__OPTIMIZE_SIZE__)
+#define STRUTIL_ASIDE(value) __asm__("" : "+h"(value))
+#else
+#define STRUTIL_ASIDE(value) static_cast<void>(value)
 #endif
 
 namespace {
@@ -67,7 +74,6 @@ WCHAR* text(const WCHAR* str) { return const_cast<WCHAR*>(str); }
 // Bounds of a walk: how many more units it may take.
 struct Count {
   int left = INT_MAX;
-
   bool take(int count) {
     if (left < count) return false;
     left -= count;
@@ -80,15 +86,15 @@ struct Endless {
 };
 
 // A small build shares what a fast one repeats: a function that serves several of the library's,
-// rather than a copy in each; a loop with a bound also for those without; one step a turn.
+// rather than a copy in each; a loop with a bound, however great, also for those without.
 #if defined(__OPTIMIZE_SIZE__)
 #define STRUTIL_CORE inline
+constexpr bool isSmall = true;
 using Whole = Count;
-enum { stepsATurn = 1 };
 #else
 #define STRUTIL_CORE STRUTIL_INLINE
+constexpr bool isSmall = false;
 using Whole = Endless;
-enum { stepsATurn = 4 };
 #endif
 
 // As an integer: of a pointer that moves, Clang makes several, each with an offset of its own.
@@ -97,117 +103,90 @@ void advance(Unit*& at, uintptr_t count) {
   at = reinterpret_cast<Unit*>(reinterpret_cast<uintptr_t>(at) + count * sizeof(Unit));
 }
 
-// The loop of all walks. Four steps a turn: the arithmetic and the jump back, and the test of the
-// bound, cost half as much as the rest of a simple step.
-template <typename Bound, typename GoesOn, typename... Unit>
-STRUTIL_INLINE bool steps(Bound bound, const GoesOn& goesOn, Unit*&... at) {
-  if constexpr (stepsATurn == 4) {
-    for (; bound.take(4); (..., advance(at, 4))) {
-      if (STRUTIL_RARELY(!goesOn(at[0]...))) return true;
-      if (STRUTIL_RARELY(!goesOn(at[1]...))) return (..., advance(at, 1)), true;
-      if (STRUTIL_RARELY(!goesOn(at[2]...))) return (..., advance(at, 2)), true;
-      if (STRUTIL_RARELY(!goesOn(at[3]...))) return (..., advance(at, 3)), true;
-    }
-  }
-  for (; bound.take(1); (..., advance(at, 1))) {
-    if (!goesOn(*at...)) return true;
-  }
+template <typename... Unit>
+STRUTIL_INLINE bool stopAfter(uintptr_t count, Unit*&... at) {
+  (..., advance(at, count));
   return false;
 }
 
 // What all loops over text are expressed through: passes the units that the pointers point at to
 // `goesOn`, one of each, and moves all pointers on by one unit, until `goesOn` returns false or the
-// bound is reached. The pointers are left at the units that ended it, or after the last ones.
-// Returns whether a unit ended it, not the bound.
-template <typename Bound, typename Unit, typename GoesOn>
-STRUTIL_INLINE bool walk(Bound bound, Unit*& at, const GoesOn& goesOn) {
-  return steps(bound, goesOn, at);
+// bound is reached, and returns whether that ended it. The pointers are left at the units that
+// ended it, or after the last ones. Four steps a turn: arithmetic, jump and bound cost half a
+// simple step.
+template <typename Bound, typename GoesOn, typename... Unit>
+STRUTIL_INLINE bool walk(Bound bound, const GoesOn& goesOn, Unit*&... at) {
+  for (; !isSmall && bound.take(4); (..., advance(at, 4))) {
+    if (STRUTIL_RARELY(!goesOn(at[0]...))) return false;
+    if (STRUTIL_RARELY(!goesOn(at[1]...))) return stopAfter(1, at...);
+    if (STRUTIL_RARELY(!goesOn(at[2]...))) return stopAfter(2, at...);
+    if (STRUTIL_RARELY(!goesOn(at[3]...))) return stopAfter(3, at...);
+  }
+  for (; bound.take(1); (..., advance(at, 1))) {
+    if (!goesOn(*at...)) return false;
+  }
+  return true;
 }
 
-template <typename Bound, typename To, typename From, typename GoesOn>
-STRUTIL_INLINE bool walk(Bound bound, To*& to, From*& from, const GoesOn& goesOn) {
-  return steps(bound, goesOn, to, from);
+// Clang would make a constant before the loop and keep a register for it.
+template <typename Value>
+STRUTIL_INLINE Value late(Value value) {
+#if defined(__clang__)
+  STRUTIL_OPAQUE(value);
+#endif
+  return value;
 }
-
-}  // namespace
 
 // Lengths and case mapping
 
-namespace {
+enum { caseBit = 'a' - 'A' };  // what separates the two cases of a letter
 
-// What separates the two cases of a letter.
-enum { caseBit = 'a' - 'A' };
-
-// Whether c is one of the 26 letters from `first` on.
-bool isLetterFrom(unsigned first, unsigned c) { return c - first < 26; }
+bool isLetterFrom(unsigned first, int c) { return static_cast<unsigned>(c) - first < 26; }
 
 template <typename Unit>
-STRUTIL_CORE int length(const Unit* str) {
+STRUTIL_INLINE int length(const Unit* str) {
   if (!str) return 0;
   const Unit* end = str;
-  walk(Endless{}, end, [](unsigned unit) { return unit != 0; });
+  walk(Endless{}, [](unsigned unit) { return unit != 0; }, end);
   return static_cast<int>(end - str);
 }
 
-// Adds `change` to the letters from `first` on. Two tests against constants, of which most units
-// need one, rather than one of a range, which needs a copy of the unit.
+// Adds `change` to the 26 letters from `first` on. Most units need only the first test.
 template <typename Unit>
 STRUTIL_CORE Unit* switchCase(Unit* str, unsigned first, int change) {
   if (!str) return nullptr;
   Unit* at = str;
-  walk(Endless{}, at, [=](Unit& unit) {
+  const auto mapUnit = [=](Unit& unit) {
     if (unit < first) return unit != 0;
     if (unit < first + 26) unit = static_cast<Unit>(unit + change);
     return true;
-  });
+  };
+  walk(Endless{}, mapUnit, at);
   return str;
 }
 
-}  // namespace
-
-int StrLen(const char* str) { return length(units(str)); }
-int WStrLen(const WCHAR* str) { return length(units(str)); }
-
-int CharToLower(const int c) {
-  return isLetterFrom('A', static_cast<unsigned>(c)) ? c + caseBit : c;
-}
-
-int CharToUpper(const int c) {
-  return isLetterFrom('a', static_cast<unsigned>(c)) ? c - caseBit : c;
-}
-
-char* StrUpper(char* str) { return text(switchCase(units(str), 'a', -caseBit)); }
-WCHAR* WStrUpper(WCHAR* str) { return switchCase(str, 'a', -caseBit); }
-
-char* StrLower(char* str) { return text(switchCase(units(str), 'A', caseBit)); }
-WCHAR* WStrLower(WCHAR* str) { return switchCase(str, 'A', caseBit); }
-
 // Copying
 
-namespace {
-
-// Copies up to the terminator, or up to the bound without one, and returns where it ended.
+// Copies up to the terminator, or up to the bound, there with a terminator of its own if asked, and
+// returns where that is.
 template <typename To, typename From, typename Bound>
-STRUTIL_CORE To* copyUnits(To* dst, const From* src, Bound bound) {
-  walk(bound, dst, src, [](To& to, unsigned from) {
-    to = static_cast<To>(from);
-    return from != 0;
-  });
+STRUTIL_CORE To* copyUnits(To* dst, const From* src, Bound bound, bool terminated = false) {
+  const auto copyUnit = [](To& to, From from) { return (to = from) != 0; };
+  if (walk(bound, copyUnit, dst, src) && terminated) *dst = 0;
   return dst;
 }
 
 template <typename Unit>
-STRUTIL_CORE void copy(Unit* dst, const Unit* src) {
+STRUTIL_INLINE void copy(Unit* dst, const Unit* src) {
   if (!dst || dst == src) return;
-  *dst = 0;
+  if (!src) *dst = 0;
   if (src) copyUnits(dst, src, Endless{});
 }
 
 template <typename Unit>
 void copyBuf(Unit* dst, int n, const Unit* src) {
   if (!dst || dst == src || n < 1) return;
-  *dst = 0;
-  if (src) *copyUnits(dst, src, Count{n - 1}) = 0;
+  copyUnits(dst, src, Count{src ? n - 1 : 0}, true);
 }
 
 template <typename Unit>
@@ -217,67 +196,51 @@ void nCopy(Unit* dst, const Unit* src, int n) {
   if (src) copyUnits(dst, src, Count{n});
 }
 
-}  // namespace
-
-void StrCopy(char* dst, const char* src) { copy(units(dst), units(src)); }
-void WStrCopy(WCHAR* dst, const WCHAR* src) { copy(dst, src); }
-
-void StrCopyBuf(char* dst, int n, const char* src) { copyBuf(units(dst), n, units(src)); }
-void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) { copyBuf(dst, n, src); }
-
-void StrNCopy(char* dst, const char* src, int n) { nCopy(units(dst), units(src), n); }
-void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) { nCopy(dst, src, n); }
-
 // Concatenation
 
-namespace {
+// Pairs such as these let a template call the twin of its own width.
+int strLen(const Byte* str) { return StrLen(text(str)); }
+int strLen(const WCHAR* str) { return WStrLen(str); }
 
 template <typename Unit>
-void cat(Unit* dst, const Unit* src) {
-  if (!dst || !src) return;
-  copyUnits(dst + length(dst), src, Endless{});
+STRUTIL_INLINE int lengthOf(const Unit* str) {
+  return isSmall ? strLen(str) : length(str);
+}
+
+template <typename Unit, typename Bound>
+void cat(Unit* dst, const Unit* src, Bound bound) {
+  if (dst && src) copyUnits(dst + lengthOf(dst), src, bound, true);
 }
 
 template <typename Unit>
 STRUTIL_CORE void nCatBuf(Unit* dst, int n, const Unit* src, int num) {
   if (!dst || !src) return;
-  const int off = length(dst);
+  const int off = lengthOf(dst);
   if (n <= off + 1) return;
   const int nMax = n - off - 1;
-  *copyUnits(dst + off, src, Count{num < nMax ? num : nMax}) = 0;
+  copyUnits(dst + off, src, Count{num < nMax ? num : nMax}, true);
 }
 
-}  // namespace
-
-void StrCat(char* dst, const char* src) { cat(units(dst), units(src)); }
-void WStrCat(WCHAR* dst, const WCHAR* src) { cat(dst, src); }
-
-void StrCatBuf(char* dst, int n, const char* src) { nCatBuf(units(dst), n, units(src), INT_MAX); }
-void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) { nCatBuf(dst, n, src, INT_MAX); }
-
-void WStrNCat(WCHAR* dst, const WCHAR* src, int num) { nCatBuf(dst, INT_MAX, src, num); }
-
-void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) { nCatBuf(dst, n, src, num); }
-
 // Searching
-
-namespace {
 
 // Whether two units that differ are the two cases of a letter.
 STRUTIL_INLINE bool areCases(int a, int b) {
   if (STRUTIL_RARELY((a ^ b) != caseBit)) return false;
-  return isLetterFrom('a', static_cast<unsigned>(a | b));
+  return isLetterFrom('a', a | b);
 }
 
 template <typename Unit>
-STRUTIL_CORE Unit* findUnit(Unit* str, unsigned c) {
+STRUTIL_INLINE Unit* findUnit(Unit* str, unsigned c) {
   if (!str) return nullptr;
-  unsigned last = 0;
-  walk(Endless{}, str, [c, &last](unsigned unit) {
-    last = unit;
-    return !STRUTIL_RARELY(unit == c) && !STRUTIL_RARELY(unit == 0);
-  });
-  return last == 0 ? nullptr : str;
+  Unit* place = nullptr;
+  const auto isOther = [c, &place](Unit& unit) {
+    if (STRUTIL_RARELY(unit == 0)) return false;
+    if (!STRUTIL_RARELY(unit == c)) return true;
+    place = &unit;
+    return false;
+  };
+  walk(Endless{}, isOther, str);
+  return place;
 }
 
 // Looks for the first unit of substr before it compares the rest. Where the rest fails at the
@@ -289,120 +252,97 @@ STRUTIL_CORE const Unit* find(const Unit* str, const Unit* substr, bool ignoreCa
   if (first == 0) return str;
   const int other = ignoreCase && areCases(first, first ^ caseBit) ? first ^ caseBit : first;
   for (;; ++str) {
-    int a = 0;
-    int b = 0;
-    walk(Endless{}, str, [=, &a](int unit) {
-      a = unit;
-      return unit != first && unit != other && unit != 0;
-    });
-    if (a == 0) return nullptr;
+    const Unit* place = nullptr;
+    const auto isOther = [=, &place](const Unit& unit) {
+      if (unit != first && unit != other) return unit != 0;
+      place = &unit;
+      return false;
+    };
+    walk(Endless{}, isOther, str);
+    if (!place) return late<const Unit*>(nullptr);
+    str = place;
     const Unit* at = str + 1;
     const Unit* rest = substr + 1;
-    walk(Endless{}, at, rest, [=, &a, &b](int unit, int wanted) {
+    int a = 0;
+    int b = 0;
+    const auto match = [=, &a, &b](int unit, int wanted) {
       a = unit;
       b = wanted;
       if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(unit, wanted);
       if (STRUTIL_RARELY(wanted == 0)) return false;
       return true;
-    });
+    };
+    walk(Endless{}, match, at, rest);
     if (b == 0) return str;
-    if (a == 0) return nullptr;
+    if (a == 0) return late<const Unit*>(nullptr);
   }
 }
 
-}  // namespace
-
-// A caller fills the register of `c` by the sign of its own plain char, and compilers trust that it
-// was by that of ours: the low 8 bits count.
-char* StrChr(const char* str, const char c) {
-  unsigned unit = static_cast<Byte>(c);
-  STRUTIL_OPAQUE(unit);
-  return text(findUnit(units(str), static_cast<Byte>(unit)));
-}
-WCHAR* WStrChr(const WCHAR* str, const WCHAR c) { return text(findUnit(str, c)); }
-
-char* StrStr(const char* str, const char* substr) {
-  return text(find(units(str), units(substr), false));
-}
-WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) { return text(find(str, substr, false)); }
-
-char* StrIStr(const char* str, const char* substr) {
-  return text(find(units(str), units(substr), true));
-}
-WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) { return text(find(str, substr, true)); }
-
 // Comparison
 
-namespace {
+// Which texts are equal; and StrNICmp's rule, by which every difference is negative.
+enum Way { exact, ignoreCase, ignoreCaseAndOrder };
 
 // Returns 0, or the position i + 1 of the first difference: negative where str1 has the smaller
 // unit. Units that are equal are not mapped, and the others only to see which is the smaller.
 template <typename Unit, typename Bound>
-STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, bool ignoreCase) {
+STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, Way way) {
   if (!str1 || !str2) return (str1 ? 1 : 0) - (str2 ? 1 : 0);
   if (str1 == str2) return 0;
   const Unit* at = str1;
+  STRUTIL_ASIDE(str1);
+  bool differ = false;
   int a = 0;
   int b = 0;
-  const bool stopped = walk(bound, at, str2, [=, &a, &b](int unit1, int unit2) {
+  const auto match = [=, &differ, &a, &b](int unit1, int unit2) {
     a = unit1;
     b = unit2;
-    if (STRUTIL_RARELY(a != b)) return ignoreCase && areCases(unit1, unit2);
+    if (STRUTIL_RARELY(a != b)) {
+      if (way != exact && areCases(unit1, unit2)) return true;
+      differ = true;
+      return false;
+    }
     if (STRUTIL_RARELY(unit2 == 0)) return false;
     return true;
-  });
-  if (!stopped || a == b) return 0;
-  if (ignoreCase) {
+  };
+  walk(bound, match, at, str2);
+  if (!differ) return late(0);
+  STRUTIL_ASIDE(str1);
+  const int position = static_cast<int>(at - str1) + 1;
+  if (way == ignoreCaseAndOrder) return -position;
+  if (way == ignoreCase) {
     a = CharToLower(a);
     b = CharToLower(b);
   }
-  const int position = static_cast<int>(at - str1) + 1;
   return a < b ? -position : position;
 }
 
-}  // namespace
-
-int StrNCmp(const char* str1, const char* str2, int n) {
-  return compare(units(str1), units(str2), Count{n}, false);
-}
-int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) {
-  return compare(str1, str2, Count{n}, false);
-}
-
-// Irregular by contract: every difference is negative, only the null rule gives a positive result.
-int StrNICmp(const char* str1, const char* str2, int n) {
-  const int result = compare(units(str1), units(str2), Count{n}, true);
-  return str1 && str2 && result > 0 ? -result : result;
-}
-int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) {
-  return compare(str1, str2, Count{n}, true);
-}
-
-int StrCmp(const char* str1, const char* str2) {
-  return compare(units(str1), units(str2), Whole{}, false);
-}
-int WStrCmp(const WCHAR* str1, const WCHAR* str2) { return compare(str1, str2, Whole{}, false); }
-
-int StrICmp(const char* str1, const char* str2) {
-  return compare(units(str1), units(str2), Whole{}, true);
-}
-int WStrICmp(const WCHAR* str1, const WCHAR* str2) { return compare(str1, str2, Whole{}, true); }
-
 // Tokenizing and splitting
 
-namespace {
+Byte* strChr(const Byte* str, unsigned c) { return units(StrChr(text(str), static_cast<char>(c))); }
+WCHAR* strChr(const WCHAR* str, unsigned c) { return WStrChr(str, static_cast<WCHAR>(c)); }
 
-// StrChr for sets, which are short: a turn of the walk costs more than it saves. No set contains
-// the terminator.
+// Sets are short: a turn of the walk costs more than it saves.
 template <typename Unit>
-STRUTIL_CORE bool contains(const Unit* set, unsigned unit) {
-  unsigned one = *set;
-  if (one == unit) return unit != 0;
-  if (one == 0) return false;
-  while ((one = *++set) != 0) {
+STRUTIL_INLINE bool contains(const Unit* set, unsigned unit) {
+  if (isSmall) return strChr(set, unit) != nullptr;
+  for (unsigned one = *set; one != 0; one = *++set) {
     if (one == unit) return true;
   }
   return false;
+}
+
+// Returns the first place from str on whose unit the set contains, or the terminator. Most sets are
+// of one unit.
+template <typename Unit>
+STRUTIL_INLINE Unit* findOneOf(Unit* str, const Unit* set) {
+  const unsigned only = *set;
+  if (!isSmall && (only == 0 || set[1] == 0)) {
+    walk(Endless{}, [only](unsigned unit) { return unit != only && unit != 0; }, str);
+  } else {
+    while (*str != 0 && !contains(set, *str)) ++str;
+  }
+  return str;
 }
 
 template <typename Unit>
@@ -412,12 +352,9 @@ STRUTIL_CORE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   while (contains(dlmt, *start)) ++start;
   *off = static_cast<int>(start - str);
   if (*start == 0) return nullptr;
-  Unit* end = start + 1;
-  while (*end != 0 && !contains(dlmt, *end)) ++end;
+  Unit* end = findOneOf(start + 1, dlmt);
+  if (*end != 0) *end++ = 0;
   *off = static_cast<int>(end - str);
-  if (*end == 0) return start;
-  *end = 0;
-  ++*off;
   return start;
 }
 
@@ -430,23 +367,7 @@ int split(Text* str, const Text* dlmt, Text** wrd) {
   return num;
 }
 
-}  // namespace
-
-char* StrToken(char* str, int* off, const char* dlmt) {
-  return text(token(units(str), off, units(dlmt)));
-}
-WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) { return token(str, off, dlmt); }
-
-int StrSplit(char* str, const char* dlmt, char** wrd) { return split(str, dlmt, wrd); }
-int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) { return split(str, dlmt, wrd); }
-
 // Trimming
-
-namespace {
-
-// Pairs such as these let a template call the twin of its own width.
-int strLen(const Byte* str) { return StrLen(text(str)); }
-int strLen(const WCHAR* str) { return WStrLen(str); }
 
 void strCopy(Byte* dst, const Byte* src) { StrCopy(text(dst), text(src)); }
 void strCopy(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
@@ -458,70 +379,54 @@ int trim(Unit* str, const Unit* trimSet) {
   if (!trimSet) trimSet = &emptySet;
   Unit* first = str;
   while (contains(trimSet, *first)) ++first;
-  Unit* end = first + strLen(first);
+  Unit* end = first + lengthOf(first);
   while (end > first + 1 && contains(trimSet, end[-1])) --end;
   *end = 0;
   const int kept = static_cast<int>(end - first);
-  strCopy(str, first);
+  if (first != str) strCopy(str, first);
   return kept;
 }
 
-}  // namespace
-
-int StrTrim(char* str, const char* trimSet) { return trim(units(str), units(trimSet)); }
-int WStrTrim(WCHAR* str, const WCHAR* trimSet) { return trim(str, trimSet); }
-
 // Replacing
-
-namespace {
 
 const Byte* strStr(const Byte* str, const Byte* substr) {
   return units(StrStr(text(str), text(substr)));
 }
 const WCHAR* strStr(const WCHAR* str, const WCHAR* substr) { return WStrStr(str, substr); }
 
+// A length that is too great for an int wraps.
 template <typename Unit>
 int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
   const int len_rep = strLen(rep);
   Unit* tmp = result;
-  int length = 0;
-  int count = 0;
-  for (; const Unit* const ins = strStr(orig, rep); ++count) {
+  unsigned length = 0;
+  const int len_with = tmp ? 0 : strLen(with);
+  for (; const Unit* const ins = strStr(orig, rep); orig = ins + len_rep) {
     const int len_front = static_cast<int>(ins - orig);
-    if (tmp) tmp = copyUnits(copyUnits(tmp, orig, Count{len_front}), with, Endless{});
-    length += len_front;
-    orig = ins + len_rep;
+    if (tmp) {
+      tmp = copyUnits(copyUnits(tmp, orig, Count{len_front}), with, Endless{});
+    } else {
+      length += static_cast<unsigned>(len_front) + static_cast<unsigned>(len_with);
+    }
   }
-  if (count > 0) length += count * strLen(with);
-  if (tmp) strCopy(tmp, orig);
-  return length + strLen(orig);
-}
-
-}  // namespace
-
-int StrReplace(const char* orig, const char* rep, const char* with, char* result) {
-  return replace(units(orig), units(rep), units(with), units(result));
-}
-int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) {
-  return replace(orig, rep, with, result);
+  if (tmp) {
+    strCopy(tmp, orig);
+    length = static_cast<unsigned>(tmp - result);
+  }
+  return static_cast<int>(length + static_cast<unsigned>(strLen(orig)));
 }
 
 // Integer text conversion
 
-namespace {
-
-struct Division {
-  int quotient;
-  int remainder;
-};
-
-Division divide(int dividend, int divisor) {
+int divide(int dividend, int divisor, int& remainder) {
 #if defined(STRUTIL_IDIVMOD)
   const uint64_t both = STRUTIL_IDIVMOD(dividend, divisor);
-  return {static_cast<int>(both), static_cast<int>(both >> 32)};
+  remainder = static_cast<int>(both >> 32);
+  return static_cast<int>(both);
 #else
-  return {dividend / divisor, dividend % divisor};
+  remainder = dividend % divisor;
+  return dividend / divisor;
 #endif
 }
 
@@ -540,10 +445,13 @@ Unit* fromInt(int value, Unit* string, int radix) {
   if (negative && value != INT_MIN) value = -value;
   Unit* end = string;
   do {
-    Division by = divide(value, radix);
-    if (STRUTIL_RARELY(by.quotient < 0)) by = {-by.quotient, -by.remainder};
-    *end++ = digitOf<Unit>(static_cast<unsigned>(by.remainder));
-    value = by.quotient;
+    int digit = 0;
+    value = divide(value, radix, digit);
+    if (STRUTIL_RARELY(value < 0)) {
+      value = -value;
+      digit = -digit;
+    }
+    *end++ = digitOf<Unit>(static_cast<unsigned>(digit));
   } while (value != 0);
   if (negative) *end++ = '-';
   *end = 0;
@@ -562,35 +470,22 @@ int toInt(const Unit* string) {
   const bool negative = *string == '-';
   if (negative) ++string;
   unsigned val = 0;
-  walk(Endless{}, string, [&val](unsigned unit) {
+  const auto addDigit = [&val](unsigned unit) {
     const unsigned digit = unit - '0';
     if (digit > 9) return false;
     val = val * 10 + digit;
     return true;
-  });
+  };
+  walk(Endless{}, addDigit, string);
   return static_cast<int>(negative ? 0 - val : val);
 }
 
-}  // namespace
-
-char* IntToStr(int value, char* string, int radix) {
-  return text(fromInt(value, units(string), radix));
-}
-WCHAR* IntToWStr(int value, WCHAR* string, int radix) { return fromInt(value, string, radix); }
-
-int StrToInt(const char* string) { return toInt(units(string)); }
-int WStrToInt(const WCHAR* string) { return toInt(string); }
-
 // Width conversion
-
-namespace {
 
 template <typename To, typename From>
 STRUTIL_CORE void copyCount(To*& des, const From*& src, int count) {
-  walk(Count{count}, des, src, [](To& to, From from) {
-    to = from;
-    return true;
-  });
+  const auto copyUnit = [](To& to, From from) { return to = from, true; };
+  walk(Count{count}, copyUnit, des, src);
 }
 
 #if defined(STRUTIL_ALIASING)
@@ -603,41 +498,147 @@ struct STRUTIL_ALIASING Pair {
 bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % sizeof(Pair) == 0; }
 #endif
 
-// The library's only constant data.
-constexpr char emptyText[] = "";
+constexpr char emptyText[] = "";  // the library's only constant data
 
 }  // namespace
 
-void BytesToWords(const char* src, WORD* des, int len) {
+// Lengths and case mapping
+int StrLen(const char* str) noexcept { return length(units(str)); }
+int WStrLen(const WCHAR* str) noexcept { return length(units(str)); }
+int CharToLower(const int c) noexcept { return isLetterFrom('A', c) ? c + caseBit : c; }
+int CharToUpper(const int c) noexcept { return isLetterFrom('a', c) ? c - caseBit : c; }
+char* StrUpper(char* str) noexcept { return text(switchCase(units(str), 'a', -caseBit)); }
+WCHAR* WStrUpper(WCHAR* str) noexcept { return switchCase(str, 'a', -caseBit); }
+char* StrLower(char* str) noexcept { return text(switchCase(units(str), 'A', caseBit)); }
+WCHAR* WStrLower(WCHAR* str) noexcept { return switchCase(str, 'A', caseBit); }
+
+// Copying
+void StrCopy(char* dst, const char* src) noexcept { copy(units(dst), units(src)); }
+void WStrCopy(WCHAR* dst, const WCHAR* src) noexcept { copy(dst, src); }
+void StrCopyBuf(char* dst, int n, const char* src) noexcept { copyBuf(units(dst), n, units(src)); }
+void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) noexcept { copyBuf(dst, n, src); }
+void StrNCopy(char* dst, const char* src, int n) noexcept { nCopy(units(dst), units(src), n); }
+void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) noexcept { nCopy(dst, src, n); }
+
+// Concatenation
+void StrCat(char* dst, const char* src) noexcept { cat(units(dst), units(src), Endless{}); }
+void WStrCat(WCHAR* dst, const WCHAR* src) noexcept { cat(dst, src, Endless{}); }
+void StrCatBuf(char* dst, int n, const char* src) noexcept {
+  nCatBuf(units(dst), n, units(src), INT_MAX);
+}
+void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) noexcept { nCatBuf(dst, n, src, INT_MAX); }
+void WStrNCat(WCHAR* dst, const WCHAR* src, int num) noexcept { cat(dst, src, Count{num}); }
+void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) noexcept {
+  nCatBuf(dst, n, src, num);
+}
+
+// Searching
+
+// A caller fills the register of `c` by the sign of its own plain char, and compilers trust that it
+// was by that of ours: the low 8 bits count.
+char* StrChr(const char* str, const char c) noexcept {
+  unsigned unit = static_cast<Byte>(c);
+  STRUTIL_OPAQUE(unit);
+  return text(findUnit(units(str), static_cast<Byte>(unit)));
+}
+WCHAR* WStrChr(const WCHAR* str, const WCHAR c) noexcept { return text(findUnit(str, c)); }
+char* StrStr(const char* str, const char* substr) noexcept {
+  return text(find(units(str), units(substr), false));
+}
+WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) noexcept {
+  return text(find(str, substr, false));
+}
+char* StrIStr(const char* str, const char* substr) noexcept {
+  return text(find(units(str), units(substr), true));
+}
+WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept {
+  return text(find(str, substr, true));
+}
+
+// Comparison
+int StrNCmp(const char* str1, const char* str2, int n) noexcept {
+  return compare(units(str1), units(str2), Count{n}, exact);
+}
+int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return compare(str1, str2, Count{n}, exact);
+}
+int StrNICmp(const char* str1, const char* str2, int n) noexcept {
+  return compare(units(str1), units(str2), Count{n}, ignoreCaseAndOrder);
+}
+int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return compare(str1, str2, Count{n}, ignoreCase);
+}
+int StrCmp(const char* str1, const char* str2) noexcept {
+  return compare(units(str1), units(str2), Whole{}, exact);
+}
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) noexcept {
+  return compare(str1, str2, Whole{}, exact);
+}
+int StrICmp(const char* str1, const char* str2) noexcept {
+  return compare(units(str1), units(str2), Whole{}, ignoreCase);
+}
+int WStrICmp(const WCHAR* str1, const WCHAR* str2) noexcept {
+  return compare(str1, str2, Whole{}, ignoreCase);
+}
+
+// Tokenizing and splitting
+char* StrToken(char* str, int* off, const char* dlmt) noexcept {
+  return text(token(units(str), off, units(dlmt)));
+}
+WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }
+int StrSplit(char* str, const char* dlmt, char** wrd) noexcept { return split(str, dlmt, wrd); }
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept { return split(str, dlmt, wrd); }
+
+// Trimming
+int StrTrim(char* str, const char* trimSet) noexcept { return trim(units(str), units(trimSet)); }
+int WStrTrim(WCHAR* str, const WCHAR* trimSet) noexcept { return trim(str, trimSet); }
+
+// Replacing
+int StrReplace(const char* orig, const char* rep, const char* with, char* result) noexcept {
+  return replace(units(orig), units(rep), units(with), units(result));
+}
+int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* result) noexcept {
+  return replace(orig, rep, with, result);
+}
+
+// Integer text conversion
+char* IntToStr(int value, char* string, int radix) noexcept {
+  return text(fromInt(value, units(string), radix));
+}
+WCHAR* IntToWStr(int value, WCHAR* string, int radix) noexcept {
+  return fromInt(value, string, radix);
+}
+int StrToInt(const char* string) noexcept { return toInt(units(string)); }
+int WStrToInt(const WCHAR* string) noexcept { return toInt(string); }
+
+// Width conversion
+void BytesToWords(const char* src, WORD* des, int len) noexcept {
   const Byte* from = units(src);
   if (from && des) copyCount(des, from, len);
 }
-
-WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) {
+WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) noexcept {
   if (!des) return nullptr;
-  *des = 0;
-  if (src) *copyUnits(des, units(src), Count{bufsize < 1 ? 0 : bufsize - 1}) = 0;
+  copyUnits(des, units(src), Count{src && bufsize > 0 ? bufsize - 1 : 0}, true);
   return des;
 }
-
-char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
+char* WStrToStr(const WCHAR* src, char* des, int bufsize) noexcept {
   if (!des) return const_cast<char*>(emptyText);
+  *des = 0;
+  if (!src || bufsize < 1) return des;
   Byte* at = units(des);
-  const auto room = [&] {  // the terminator's unit included
-    return bufsize - static_cast<int>(at - units(des));
-  };
   unsigned unit = 0;
-  const auto copyPrintable = [&](Byte& to, unsigned from) {
+  const auto copyPrintable = [&unit](Byte& to, unsigned from) {
     unit = from;
     if (unit < ' ' || unit > '~') return false;
     to = static_cast<Byte>(unit);
     return true;
   };
-  if (!src) bufsize = 0;
-  while (bufsize > 0 && walk(Count{room() - 1}, at, src, copyPrintable) && unit != 0) {
+  // How many units fit before the terminator.
+  const auto room = [&] { return bufsize - 1 - static_cast<int>(at - units(des)); };
+  while (!walk(Count{room()}, copyPrintable, at, src) && unit != 0) {
     int shift = 12;  // of the first digit
     while (shift > 0 && unit >> shift == 0) shift -= 4;
-    if (room() < (shift >> 2) + 7) break;
+    if (room() < (shift >> 2) + 6) break;
     *at++ = '&';
     *at++ = '(';
     *at++ = '0';
@@ -649,8 +650,7 @@ char* WStrToStr(const WCHAR* src, char* des, int bufsize) {
   *at = 0;
   return des;
 }
-
-void WStrToWords(const WCHAR* src, WORD* des, int len) {
+void WStrToWords(const WCHAR* src, WORD* des, int len) noexcept {
   if (!src || !des || len < 1) return;
 #if defined(STRUTIL_ALIASING)
   if (isAligned(src) && isAligned(des)) {

@@ -2,6 +2,10 @@
 #include <base_types.h>
 #include <strutil.h>
 
+#ifdef __cplusplus
+static_assert(noexcept(StrLen("")), "a caller need not clean up after an exception");
+#endif
+
 static WCHAR from[8] __attribute__((aligned(4)));
 static WORD to[8] __attribute__((aligned(4)));
 
