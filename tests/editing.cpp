@@ -2,17 +2,22 @@
 
 namespace {
 
-const std::vector<Units> texts = allTexts(u"a,;\u00e9", 4);
-const std::vector<Units> sets = {u"", u",", u",;", u";,;,", u"\u00e9", u"\u00e9a;,"};
+const std::vector<Units> texts = allTexts(u"a,;\u00ac", 4);
+const std::vector<Units> sets = {u"", u",", u"\u00ac", u",;", u";,;,", u"\u00e9", u"\u00aca;,"};
 
-// Tokens of every length up to 24 and as many as that, between runs of all units of a set of 6.
-const Units manySet = u",; .\u00fe\t";
-Units manyTokens() {
+// Sets of up to 300 units, and tokens of every length up to 40 between runs of their units.
+const Units manySet = u",; .\u00fe\t-";
+Units manyTokens(const Units& set) {
   Units line;
-  for (size_t i = 0; i < 25; ++i) {
-    line += manySet.substr(i % 6) + manySet.substr(0, i % 4) + longText(i);
+  for (size_t i = 0; i < 41; ++i) {
+    line += set.substr(i % set.size()) + set.substr(0, i % 4) + longText(i);
   }
-  return line + manySet + manySet;
+  return line + set + set;
+}
+Units longSet(size_t size) {
+  Units set;
+  while (set.size() < size) set += u"#$%&'()*+"[set.size() % 9];
+  return set + u"!";
 }
 
 TEST_SUITE_BEGIN("Tokenizing and splitting");
@@ -26,8 +31,29 @@ TEST_CASE_TEMPLATE("StrToken and StrSplit walk to the end", Unit, char, WCHAR) {
       }
     }
   }
-  checkSplit<Unit>(manyTokens(), manySet);
-  checkWalk<Unit>(manyTokens(), manySet, 0);
+  for (size_t size = 1; size <= manySet.size(); ++size) {
+    checkSplit<Unit>(manyTokens(manySet), manySet.substr(0, size));
+    checkWalk<Unit>(manyTokens(manySet), manySet.substr(0, size), 0);
+  }
+  for (char16_t c = 1; c < 256; ++c) {
+    checkSplit<Unit>(allUnits(), {c});
+    checkSplit<Unit>(allUnits(), {'~', c});
+  }
+  for (const size_t size : Sizes{31, 63, 255, 256}) checkWalk<Unit>(u"a!b!", longSet(size), 0);
+  for (const size_t length : Sizes{255, 256, 1023, 70000}) {
+    if (isBoard && length > 1023) continue;
+    checkSplit<Unit>(longText(length) + u",-" + longText(length), u",");
+    checkWalk<Unit>(longText(length) + u"!" + Units(length, u'#'), longSet(9), 0);
+  }
+}
+
+TEST_CASE("WStrToken, WStrSplit, WStrTrim and WStrReplace compare all 16 bits") {
+  for (const Units& set : {u","s, u"\u012c"s, u"\u802c"s, u";\u012c"s, u"\u802ca"s}) {
+    const Units text = u"\u012ca,\u012cb\u802c,\u8061,\U00010000,\u012c";
+    checkSplit<WCHAR>(text, set);
+    checkTrim<WCHAR>(text, set);
+    checkReplace<WCHAR>(text, set, u"\u012c\uff41");
+  }
 }
 
 TEST_CASE_TEMPLATE("StrToken takes another set at each call", Unit, char, WCHAR) {
@@ -36,23 +62,25 @@ TEST_CASE_TEMPLATE("StrToken takes another set at each call", Unit, char, WCHAR)
   CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u" =").get())) == 0);
   CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u" ;").get())) == 4);
   CHECK(str.indexOf(twin::Token<Unit>(str.get(), &off, Text<Unit>(u"").get())) == 6);
-  str.check(u"key\0=\0a=b;c\0"s);
+  str.check([] { return "StrToken"; }, u"key\0=\0a=b;c\0"s);
 }
 
 TEST_CASE_TEMPLATE("StrToken and StrSplit answer null and write nothing", Unit, char, WCHAR) {
-  Buffer<Unit> str(u"a,b\0"s);
+  Text<Unit> str(u"a,b");
   Text<Unit> dlmt(u",");
   int off = 1;
   CHECK(twin::Token<Unit>(nullptr, &off, dlmt.get()) == nullptr);
   CHECK(twin::Token<Unit>(str.get(), nullptr, dlmt.get()) == nullptr);
   CHECK(twin::Token<Unit>(str.get(), &off, nullptr) == nullptr);
+  CHECK(twin::Token<Unit>(nullptr, nullptr, nullptr) == nullptr);
+  CHECK(twin::Token<Unit>(nullptr, &off, nullptr) == nullptr);
   CHECK(off == 1);
   Unit* wrd = nullptr;
   CHECK(twin::Split<Unit>(nullptr, dlmt.get(), &wrd) == 0);
   CHECK(twin::Split<Unit>(str.get(), nullptr, &wrd) == 0);
   CHECK(twin::Split<Unit>(str.get(), dlmt.get(), nullptr) == 0);
+  CHECK(twin::Split<Unit>(nullptr, nullptr, nullptr) == 0);
   CHECK(wrd == nullptr);
-  str.check(u"a,b\0"s);
 }
 
 TEST_SUITE_END();
@@ -62,21 +90,24 @@ TEST_CASE_TEMPLATE("StrTrim keeps what lies between the set's units", Unit, char
   for (const Units& text : texts) {
     for (const Units& set : sets) checkTrim<Unit>(text, set);
   }
-  checkTrim<Unit>(manyTokens(), manySet);
-  checkTrim<Unit>(manySet + manySet + manySet, manySet);
-  for (size_t length = 5; length < 300; length += length < 25 ? 1 : 91) {
-    checkTrim<Unit>(manySet + longText(length) + manySet, manySet);
+  checkTrim<Unit>(manyTokens(manySet), manySet);
+  for (const size_t length : Sizes{1, 2, 3, 5, 12, 24, 63, 64, 65, 255, 256, 257, 1023, 70000}) {
+    if (isBoard && length > 1023) continue;
+    const Units run = longSet(length);
+    checkTrim<Unit>(run, longSet(9));
+    checkTrim<Unit>(run + u"a" + manySet + longText(length) + manySet, longSet(9) + manySet);
+    checkTrim<Unit>(u"-" + longText(length) + run, longSet(9) + u"-");
+    checkTrim<Unit>(u"!a!", longSet(length % 1000));
   }
 }
 
 TEST_CASE_TEMPLATE("StrTrim answers null", Unit, char, WCHAR) {
-  Text<Unit> set(u" ");
-  CHECK(twin::Trim<Unit>(nullptr, set.get()) == 0);
-  for (char16_t unit = 1; unit < 256; ++unit) {
-    const Units text = Units(1, unit) + u"a" + unit + u'\0';
-    Buffer<Unit> str(text);
-    CHECK(twin::Trim<Unit>(str.get(), nullptr) == 3);
-    str.check(text);
+  CHECK(twin::Trim<Unit>(nullptr, Text<Unit>(u" ").get()) == 0);
+  CHECK(twin::Trim<Unit>(nullptr, nullptr) == 0);
+  for (const Units& text : {u""s, u" "s, u" a "s, u"\1a\1"s, u"\u00ffa\u00ff"s}) {
+    Buffer<Unit> str(text + u'\0', 0);
+    CHECK(twin::Trim<Unit>(str.get(), nullptr) == static_cast<int>(text.size()));
+    str.check([] { return "StrTrim by null"; }, text + u'\0');
   }
 }
 
@@ -84,10 +115,9 @@ TEST_SUITE_END();
 TEST_SUITE_BEGIN("Replacing");
 
 TEST_CASE_TEMPLATE("StrReplace sizes and fills alike", Unit, char, WCHAR) {
-  const std::vector<Units> patterns = allTexts(u"ab", 3);
-  for (const Units& text : allTexts(u"ab", 5)) {
+  const std::vector<Units> patterns = allTexts(u"a\u00e1", 3, 1);
+  for (const Units& text : allTexts(u"a\u00e1", 6)) {
     for (const Units& pattern : patterns) {
-      if (pattern.empty()) continue;
       for (const Units& replacement : {u""s, u"a"s, pattern, u"ab\u00e9"s, pattern + pattern}) {
         checkReplace<Unit>(text, pattern, replacement);
       }
@@ -95,33 +125,39 @@ TEST_CASE_TEMPLATE("StrReplace sizes and fills alike", Unit, char, WCHAR) {
   }
   checkReplace<Unit>(u"Dear ${name}, ${name}: ${names}", u"${name}", u"Zo\u00eb Q.");
   const Units text = longText(300);
-  for (const Units& pattern : {u"a"s, text.substr(100, 24), text.substr(276), text}) {
-    for (const Units& replacement : {u""s, u"b"s, longText(25)}) {
-      checkReplace<Unit>(text + u"-" + text, pattern, replacement);
+  for (const Units& pattern : {u"a"s, text.substr(100, 24), text.substr(255), text}) {
+    for (const size_t length : Sizes{0, 1, 4, 25, 31, 32, 33, 255, 256}) {
+      if (isBoard && length > 33 && pattern.size() == 1) continue;
+      checkReplace<Unit>(text + u"-" + text, pattern, longText(length));
     }
   }
+  if (!isBoard) checkReplace<Unit>(longText(70000), text.substr(0, 2), u"");
+}
+
+TEST_CASE_TEMPLATE("StrReplace takes a pattern that is its own replacement", Unit, char, WCHAR) {
+  Text<Unit> orig(u"abcab");
+  Text<Unit> both(u"ab");
+  Buffer<Unit> result(u"", 6);
+  CHECK(twin::Replace<Unit>(orig.get(), both.get(), both.get(), nullptr) == 5);
+  CHECK(twin::Replace<Unit>(orig.get(), both.get(), both.get(), result.get()) == 5);
+  result.check([] { return "StrReplace"; }, u"abcab\0"s);
 }
 
 TEST_CASE_TEMPLATE("StrReplace writes nothing for null and for an empty pattern", Unit, char,
                    WCHAR) {
-  Text<Unit> null(nullptr);
   Text<Unit> empty(u"");
-  Text<Unit> a(u"a");
-  Text<Unit>* const rows[][3] = {
-      {&null, &a, &a}, {&a, &null, &a}, {&a, &a, &null}, {&a, &empty, &a}, {&a, &empty, &null}};
+  Text<Unit> text(u"a");
+  Unit* const none = empty.get();
+  Unit* const a = text.get();
+  Unit* const rows[][3] = {{nullptr, a, a},    {a, nullptr, a},       {a, a, nullptr},
+                           {a, none, a},       {a, none, nullptr},    {nullptr, nullptr, nullptr},
+                           {none, none, none}, {none, nullptr, none}, {nullptr, none, a}};
   Buffer<Unit> result;
   for (const auto& [orig, rep, with] : rows) {
-    CHECK(twin::Replace<Unit>(orig->get(), rep->get(), with->get(), nullptr) == 0);
-    CHECK(twin::Replace<Unit>(orig->get(), rep->get(), with->get(), result.get()) == 0);
+    CHECK(twin::Replace<Unit>(orig, rep, with, nullptr) == 0);
+    CHECK(twin::Replace<Unit>(orig, rep, with, result.get()) == 0);
   }
-  result.check(u"");
-}
-
-TEST_CASE_TEMPLATE("StrReplace may write to its own text if nothing occurs", Unit, char, WCHAR) {
-  Buffer<Unit> text(u"hello\0"s);
-  CHECK(twin::Replace<Unit>(text.get(), Text<Unit>(u"xyz").get(), Text<Unit>(u"q").get(),
-                            text.get()) == 5);
-  text.check(u"hello\0"s);
+  result.check([] { return "StrReplace"; }, u"");
 }
 
 TEST_SUITE_END();

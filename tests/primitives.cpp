@@ -2,8 +2,25 @@
 
 namespace {
 
-// Both cases of a letter, a unit between the cases and one above 127.
+// Both cases of a letter, a unit between the cases and one that differs from a letter in a bit.
 const Units alphabet = u"aA_\u00e1";
+
+// Bounds at which a loop of four or eight steps, or a count of 8 or 16 bits, could go wrong.
+std::vector<int> boundsAround(int length) {
+  std::vector<int> bounds = {INT_MIN, -65536, -1, 0, 1, 65536, 65537, 65539, INT_MAX};
+  for (int more = -5; more <= 3; ++more) bounds.push_back(length + more);
+  return bounds;
+}
+
+// Lengths at which the same could happen.
+std::vector<size_t> lengthsUpTo(size_t most) {
+  std::vector<size_t> lengths;
+  for (size_t length = 0; length <= 40; ++length) lengths.push_back(length);
+  for (const size_t length : Sizes{63, 64, 127, 255, 256, 257, 511, 512, 513, 1023, 1024, 1025}) {
+    if (length <= most) lengths.push_back(length);
+  }
+  return lengths;
+}
 
 TEST_SUITE_BEGIN("Lengths and case mapping");
 
@@ -11,15 +28,12 @@ TEST_CASE_TEMPLATE("StrLen, StrUpper and StrLower walk the whole text", Unit, ch
   CHECK(twin::Len<Unit>(nullptr) == 0);
   CHECK(twin::Upper<Unit>(nullptr) == nullptr);
   CHECK(twin::Lower<Unit>(nullptr) == nullptr);
-  // Every place at which the unrolled loop can end, more than once around.
-  const Units text = u"a1z{@\u00e1`AZ[\u00c1\u0080";
-  for (size_t start = 0; start <= text.size(); ++start) {
-    checkLengthAndCase<Unit>(text.substr(start));
+  for (const size_t length : lengthsUpTo(1025)) {
+    for (int alignment = 0; alignment < 4; ++alignment) checkLengthAndCase<Unit>(longText(length));
   }
-  for (size_t length = 12; length < 40; ++length) checkLengthAndCase<Unit>(longText(length));
-  Units every;
-  for (char16_t unit = 255; unit > 0; --unit) every += unit;
-  checkLengthAndCase<Unit>(every + every);
+  for (const Units& text : allTexts(u"\1aZ{\u00c1", 4)) checkLengthAndCase<Unit>(text);
+  checkLengthAndCase<Unit>(allUnits());
+  if (!isBoard) checkLengthAndCase<Unit>(longText(70000));
 }
 
 TEST_CASE("CharToLower and CharToUpper map the 26 letters and nothing else") {
@@ -28,19 +42,28 @@ TEST_CASE("CharToLower and CharToUpper map the 26 letters and nothing else") {
     const int upper = c >= 'a' && c <= 'z' ? c - 32 : c;
     if (CharToLower(c) != lower || CharToUpper(c) != upper) FAIL_CHECK("wrong for ", c);
   }
-  for (const int c : {INT_MIN, INT_MIN + 'a', INT_MAX}) {
+  for (const int c : {INT_MIN, INT_MIN + 'a', 0x20041, 0x20061, INT_MAX}) {
     CHECK(CharToLower(c) == c);
     CHECK(CharToUpper(c) == c);
   }
 }
 
-TEST_CASE_TEMPLATE("StrUpper, StrLower and StrCatBuf write only what changes", Unit, char, WCHAR) {
+TEST_CASE_TEMPLATE("Nothing is written where nothing changes", Unit, char, WCHAR) {
   // Where constant data is protected, a write to it is a fault.
   static const Unit capitals[] = {'A', '1', 'Z', '{', '_', 0};
   static const Unit small[] = {'a', '1', 'z', '{', '_', 0};
+  Unit* const text = const_cast<Unit*>(small);
   CHECK(twin::Upper<Unit>(const_cast<Unit*>(capitals)) == capitals);
-  CHECK(twin::Lower<Unit>(const_cast<Unit*>(small)) == small);
-  twin::CatBuf<Unit>(const_cast<Unit*>(small), 6, capitals);
+  CHECK(twin::Lower<Unit>(text) == small);
+  twin::Copy<Unit>(text, text);
+  twin::CopyBuf<Unit>(text, 0, capitals);
+  for (const int n : {INT_MIN, 0, 1, 3, 6}) {
+    twin::CopyBuf<Unit>(text, n, text);
+    twin::NCopy<Unit>(text, text, n);
+    twin::CatBuf<Unit>(text, n, capitals);
+    if constexpr (isWide<Unit>) WStrNCatBuf(text, n, capitals, 9);
+  }
+  CHECK(twin::Replace<Unit>(text, capitals, capitals, text) == 5);
 }
 
 TEST_CASE("WStrLen, WStrUpper and WStrLower take all 16 bits") {
@@ -52,14 +75,18 @@ TEST_SUITE_BEGIN("Copying");
 
 TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf and StrNCopy write what fits and no unit more", Unit, char,
                    WCHAR) {
-  for (size_t length = 0; length < 8; ++length) {
-    for (const int n : {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, INT_MAX}) {
-      checkCopies<Unit>(u"a\u00ffbcdef"s.substr(0, length), n);
+  for (const size_t length : lengthsUpTo(1025)) {
+    for (const int n : boundsAround(static_cast<int>(length))) {
+      checkCopies<Unit>(longText(length), n);
     }
   }
-  for (const int n : {12, 13, 16, 17, 20, 21, 255, 256, 257, 299, 300, 301, 302}) {
-    checkCopies<Unit>(longText(300), n);
+  for (int n = 1; n < 45; ++n) {
+    for (int alignment = 0; alignment < 4; ++alignment) checkCopies<Unit>(longText(45), n);
   }
+  checkCopies<Unit>(allUnits(), 300);
+  checkAppends<Unit>(allUnits(), allUnits(), 600, 300);
+  if (isBoard) return;
+  for (const int n : boundsAround(70000)) checkCopies<Unit>(longText(70000), n);
 }
 
 TEST_CASE("Wide copies and appends keep all 16 bits") {
@@ -67,44 +94,41 @@ TEST_CASE("Wide copies and appends keep all 16 bits") {
   checkAppends<WCHAR>(u"\u4e2d\u0100", u"\u4e2d\uffff\u0100", 9, 9);
 }
 
-TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf and StrNCopy answer null and the same pointer", Unit, char,
-                   WCHAR) {
+TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf and StrNCopy answer null", Unit, char, WCHAR) {
   Text<Unit> text(u"xy");
-  twin::Copy<Unit>(nullptr, text.get());
-  twin::CopyBuf<Unit>(nullptr, 5, text.get());
-  twin::NCopy<Unit>(nullptr, text.get(), 5);
-
-  Buffer<Unit> same(u"ab");
-  twin::Copy<Unit>(same.get(), same.get());
-  for (const int n : {0, 1, 5}) {
-    twin::CopyBuf<Unit>(same.get(), n, same.get());
-    twin::NCopy<Unit>(same.get(), same.get(), n);
+  for (Unit* const src : {text.get(), static_cast<Unit*>(nullptr)}) {
+    twin::Copy<Unit>(nullptr, src);
+    for (const int n : {-1, 0, 5}) {
+      twin::CopyBuf<Unit>(nullptr, n, src);
+      twin::NCopy<Unit>(nullptr, src, n);
+    }
   }
-  same.check(u"ab");
-
-  for (const int n : {-1, 0, 1, 5}) {
+  for (const int n : {INT_MIN, 0, 1, 5}) {
+    const auto call = callOf<Unit>("a copy of null, n", n);
     Buffer<Unit> whole(u"ab");
     twin::Copy<Unit>(whole.get(), nullptr);
-    whole.check(u"\0"s);
+    whole.check(call, u"\0"s);
     Buffer<Unit> fitted(u"ab");
     twin::CopyBuf<Unit>(fitted.get(), n, nullptr);
-    fitted.check(n < 1 ? u""s : u"\0"s);
+    fitted.check(call, n < 1 ? u""s : u"\0"s);
     Buffer<Unit> counted(u"ab");
     twin::NCopy<Unit>(counted.get(), nullptr, n);
-    counted.check(u"\0"s);
+    counted.check(call, u"\0"s);
   }
 }
 
 TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf and StrNCopy move text toward the start", Unit, char,
                    WCHAR) {
-  for (int distance = 1; distance < 6; ++distance) {
+  const Units text = lift<Unit>(longText(21)) + u'\0';
+  for (int distance = 1; distance < 12; ++distance) {
     const Units head(static_cast<size_t>(distance), u'-');
     for (int form = 0; form < 3; ++form) {
-      Buffer<Unit> buffer(head + u"abcdefg\0"s);
-      if (form == 0) twin::Copy<Unit>(buffer.get(), buffer.get() + distance);
-      if (form == 1) twin::CopyBuf<Unit>(buffer.get(), 9, buffer.get() + distance);
-      if (form == 2) twin::NCopy<Unit>(buffer.get(), buffer.get() + distance, 9);
-      buffer.check(u"abcdefg\0"s);
+      Buffer<Unit> buffer(head + text);
+      Unit* const src = buffer.get() + distance;
+      if (form == 0) twin::Copy<Unit>(buffer.get(), src);
+      if (form == 1) twin::CopyBuf<Unit>(buffer.get(), 30, src);
+      if (form == 2) twin::NCopy<Unit>(buffer.get(), src, 30);
+      buffer.check(callOf<Unit>("a copy to the left by", distance, "of form", form), text);
     }
   }
 }
@@ -114,34 +138,42 @@ TEST_SUITE_BEGIN("Concatenation");
 
 TEST_CASE_TEMPLATE("StrCat, StrCatBuf and the wide appends add what the bounds allow", Unit, char,
                    WCHAR) {
-  const int bounds[] = {INT_MIN, -1, 0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 14, 15, INT_MAX};
-  for (const Units& dst : {u""s, u"x"s, u"xyz"s, u"xyz\u00ffxyz"s}) {
-    for (const Units& src : {u""s, u"\u00ff"s, u"ab\u0080de"s, u"abcdefgh"s}) {
-      for (const int n : bounds) {
-        for (const int num : bounds) checkAppends<Unit>(dst, src, n, num);
+  for (size_t held = 0; held < 6; ++held) {
+    for (size_t length = 0; length <= 40; length += length < 10 ? 1 : 3) {
+      const Units dst = longText(held);
+      const Units src = longText(held + length).substr(held);
+      for (const int n : boundsAround(static_cast<int>(held + length))) {
+        checkAppends<Unit>(dst, src, n, INT_MAX);
+      }
+      if (!isWide<Unit>) continue;
+      for (const int num : boundsAround(static_cast<int>(length))) {
+        for (const int n : {0, 3, 9, 65541, INT_MAX}) checkAppends<Unit>(dst, src, n, num);
       }
     }
   }
-  for (const int bound : {12, 13, 16, 20, 21, 22, 255, 256, 257, 258, 277, 278, 279, 280}) {
-    checkAppends<Unit>(longText(21), longText(257), bound, INT_MAX);
-    checkAppends<Unit>(longText(21), longText(257), INT_MAX, bound);
-    checkAppends<Unit>(longText(257), longText(21), INT_MAX, bound);
+  for (const size_t length : Sizes{256, 1023, 1024, 70000}) {
+    if (isBoard && length > 1024) continue;
+    const Units text = longText(length);
+    for (const int bound : boundsAround(static_cast<int>(length + 21))) {
+      checkAppends<Unit>(text, longText(21), bound, bound);
+      checkAppends<Unit>(longText(21), text, bound, bound < 0 ? bound : bound - 21);
+    }
   }
 }
 
 TEST_CASE_TEMPLATE("StrCat and StrCatBuf write nothing for a null pointer", Unit, char, WCHAR) {
-  Buffer<Unit> buffer(u"ab\0"s);
-  for (const bool noSource : {true, false}) {
-    Unit* const dst = noSource ? buffer.get() : nullptr;
-    Unit* const src = noSource ? nullptr : buffer.get();
+  Text<Unit> text(u"ab");
+  Unit* const null = nullptr;
+  for (const auto& [dst, src] : {std::pair(text.get(), null), {null, text.get()}, {null, null}}) {
     twin::Cat<Unit>(dst, src);
-    twin::CatBuf<Unit>(dst, 9, src);
-    if constexpr (std::is_same_v<Unit, WCHAR>) {
-      WStrNCat(dst, src, 9);
-      WStrNCatBuf(dst, 9, src, 9);
+    for (const int n : {-1, 0, 9}) {
+      twin::CatBuf<Unit>(dst, n, src);
+      if constexpr (isWide<Unit>) {
+        WStrNCat(dst, src, n);
+        WStrNCatBuf(dst, n, src, 9);
+      }
     }
   }
-  buffer.check(u"ab\0"s);
 }
 
 TEST_SUITE_END();
@@ -149,19 +181,25 @@ TEST_SUITE_BEGIN("Searching");
 
 TEST_CASE_TEMPLATE("StrChr finds the first such unit but never the terminator", Unit, char, WCHAR) {
   CHECK(twin::Chr<Unit>(nullptr, 'a') == nullptr);
-  for (const Units& text : allTexts(u"ab\u00e9", 6)) {
-    for (const char16_t c : u"\0ab\u00e9"s) checkFindUnit<Unit>(text, c);
+  CHECK(twin::Chr<Unit>(nullptr, 0) == nullptr);
+  for (const Units& text : allTexts(u"\1a\u00e1\u00e9", isBoard ? 4 : 6)) {
+    for (const char16_t c : u"\0\1a\u00e1\u00e9!"s) checkFindUnit<Unit>(text, c);
   }
-  const Units text = longText(300) + u"#";
-  for (size_t start = 0; start <= 300; ++start) checkFindUnit<Unit>(text.substr(start), u'#');
+  for (char16_t c = 1; c < 256; ++c) {
+    checkFindUnit<Unit>(allUnits(c) + c, c);
+  }
+  for (const size_t length : lengthsUpTo(1025)) checkFindUnit<Unit>(longText(length) + u"##", u'#');
+  if (!isBoard) checkFindUnit<Unit>(longText(70000) + u"#", u'#');
 }
 
 TEST_CASE("Wide searches and comparisons compare all 16 bits") {
-  const Units text = u"\u0141A\u8000";
-  for (const char16_t unit : u"A\u0141\u0161a\u8000\u0041\u4141"s) {
-    checkFindUnit<WCHAR>(text, unit);
-    checkFind<WCHAR>(text, Units(1, unit));
-    checkCompare<WCHAR>(text, Units(1, unit), 5);
+  const Units text = u"\u0141A\u8000\u0041\U00010000a";
+  for (const char16_t unit : u"A\u0141\u0161a\u8000\u4141\u0100\xdc00"s) {
+    for (const Units& before : {u""s, u"A"s, u"\u0141A"s, u"\u0141A\u8000\u0041"s}) {
+      checkFindUnit<WCHAR>(text, unit);
+      checkFind<WCHAR>(text, before + unit);
+      checkCompare<WCHAR>(text, before + unit, 9);
+    }
   }
 }
 
@@ -170,12 +208,15 @@ TEST_CASE_TEMPLATE("StrStr and StrIStr answer null and empty texts in this order
   Text<Unit> empty(u"");
   Text<Unit> text(u"abc");
   for (const auto search : {twin::Str<Unit>, twin::IStr<Unit>}) {
+    CHECK(search(nullptr, nullptr) == nullptr);
     CHECK(search(nullptr, text.get()) == nullptr);
     CHECK(search(text.get(), nullptr) == nullptr);
     CHECK(search(nullptr, empty.get()) == nullptr);
+    CHECK(search(empty.get(), nullptr) == nullptr);
     CHECK(search(empty.get(), empty.get()) == nullptr);
     CHECK(search(empty.get(), text.get()) == nullptr);
     CHECK(search(text.get(), empty.get()) == text.get());
+    CHECK(search(text.get(), text.get()) == text.get());
   }
 }
 
@@ -184,6 +225,15 @@ TEST_CASE_TEMPLATE("StrStr and StrIStr find the first place", Unit, char, WCHAR)
   for (const Units& text : allTexts(alphabet, 4)) {
     for (const Units& substr : wanted) checkFind<Unit>(text, substr);
   }
+  // All ways in which a text and a pattern repeat themselves.
+  const size_t longest = isBoard ? 9 : 12;
+  const std::vector<Units> patterns = allTexts(u"a\u00e1", isBoard ? 5 : 7, 4);
+  for (const Units& text : allTexts(u"a\u00e1", longest, longest)) {
+    if (text[0] != u'a') continue;
+    for (const Units& substr : patterns) {
+      if (substr[0] == u'a') checkFind<Unit>(text, substr);
+    }
+  }
 }
 
 TEST_CASE_TEMPLATE("StrStr and StrIStr go on after a long partial match", Unit, char, WCHAR) {
@@ -191,11 +241,13 @@ TEST_CASE_TEMPLATE("StrStr and StrIStr go on after a long partial match", Unit, 
     checkFind<Unit>(u"@[ababac-abababacus", substr);
   }
   const Units text = longText(300);
-  for (size_t length = 1; length < 30; ++length) {
+  for (size_t length = 1; length < 300; length += length < 70 ? 1 : 37) {
     for (const Units& ending : {u""s, u"#"s, text.substr(0, 1)}) {
       checkFind<Unit>(text + u"#" + text, text.substr(300 - length) + ending);
     }
   }
+  const size_t far = isBoard ? 2000 : 70000;
+  checkFind<Unit>(longText(far) + u"#-" + text, u"#-" + text);
 }
 
 TEST_CASE_TEMPLATE("StrIStr, StrICmp and StrNICmp fold the 26 letters and nothing else", Unit, char,
@@ -232,8 +284,8 @@ TEST_CASE_TEMPLATE("All comparisons order null before any text", Unit, char, WCH
 }
 
 TEST_CASE_TEMPLATE("All comparisons take a text as equal to itself unread", Unit, char, WCHAR) {
-  auto unterminated = exact<Unit>(u"ab");
-  const Unit* const same = unterminated.data();
+  const Unit nothing[1] = {'a'};
+  const Unit* const same = nothing + 1;  // where no unit is
   CHECK(twin::Cmp<Unit>(same, same) == 0);
   CHECK(twin::ICmp<Unit>(same, same) == 0);
   CHECK(twin::NCmp<Unit>(same, same, 3) == 0);
@@ -247,15 +299,17 @@ TEST_CASE_TEMPLATE("All comparisons tell place and order of the first difference
     for (const Units& b : texts) {
       // Differences on both sides of a turn's end.
       for (const int n : {INT_MIN, 0, 1, 2, 3, INT_MAX}) checkCompare<Unit>(a, b, n);
-      for (const int n : {4, 5, 6}) checkCompare<Unit>(u"xYz" + a, u"xYz" + b, n);
+      for (const int n : {4, 5, 65538}) checkCompare<Unit>(u"xYz" + a, u"xYz" + b, n);
     }
   }
-  const Units text = longText(300);
-  for (size_t length = 5; length < 300; length += length < 25 ? 1 : 91) {
+  std::vector<size_t> lengths = lengthsUpTo(1025);
+  if (!isBoard) lengths.push_back(70000);
+  for (const size_t length : lengths) {
+    const Units text = longText(length);
     for (const auto& [a, b] : {std::pair(u"a", u"b"), {u"B", u"a"}, {u"", u"z"}, {u"z", u"Z"}}) {
-      for (const int more : {-1, 0, 1, 2}) {
-        const int n = static_cast<int>(length) + more;
-        checkCompare<Unit>(text.substr(0, length) + a, text.substr(0, length) + b, n);
+      for (const int n : boundsAround(static_cast<int>(length))) {
+        checkCompare<Unit>(text + a, text + b, n);
+        checkCompare<Unit>(model::upper(text) + b + u"x", text + a + u"y", n);
       }
     }
   }
