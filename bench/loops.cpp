@@ -211,14 +211,22 @@ WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) noexcept { return find<sam
 char* StrIStr(const char* str, const char* substr) noexcept { return find<lower>(str, substr); }
 WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept { return find<lower>(str, substr); }
 
-int StrNCmp(const char* a, const char* b, int n) noexcept { return nCompare<same>(a, b, n); }
-int WStrNCmp(const WCHAR* a, const WCHAR* b, int n) noexcept { return nCompare<same>(a, b, n); }
-int StrNICmp(const char* a, const char* b, int n) noexcept { return nCompare<lower>(a, b, n); }
-int WStrNICmp(const WCHAR* a, const WCHAR* b, int n) noexcept { return nCompare<lower>(a, b, n); }
-int StrCmp(const char* a, const char* b) noexcept { return compare<same>(a, b); }
-int WStrCmp(const WCHAR* a, const WCHAR* b) noexcept { return compare<same>(a, b); }
-int StrICmp(const char* a, const char* b) noexcept { return compare<lower>(a, b); }
-int WStrICmp(const WCHAR* a, const WCHAR* b) noexcept { return compare<lower>(a, b); }
+int StrNCmp(const char* str1, const char* str2, int n) noexcept {
+  return nCompare<same>(str1, str2, n);
+}
+int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return nCompare<same>(str1, str2, n);
+}
+int StrNICmp(const char* str1, const char* str2, int n) noexcept {
+  return nCompare<lower>(str1, str2, n);
+}
+int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return nCompare<lower>(str1, str2, n);
+}
+int StrCmp(const char* str1, const char* str2) noexcept { return compare<same>(str1, str2); }
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) noexcept { return compare<same>(str1, str2); }
+int StrICmp(const char* str1, const char* str2) noexcept { return compare<lower>(str1, str2); }
+int WStrICmp(const WCHAR* str1, const WCHAR* str2) noexcept { return compare<lower>(str1, str2); }
 
 char* StrToken(char* str, int* off, const char* dlmt) noexcept { return token(str, off, dlmt); }
 WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }

@@ -1,4 +1,8 @@
 # Toolchain file for Cortex-M0+ firmware built with Debian's arm-none-eabi GCC.
+if(DEFINED CACHE{CMAKE_SYSTEM_PROCESSOR} OR DEFINED CACHE{CMAKE_CXX_FLAGS_INIT})
+  message(FATAL_ERROR "this toolchain file is for the Cortex-M0+ alone: for another processor bring one "
+    "of your own, with -mcpu in its flags")
+endif()
 set(CMAKE_SYSTEM_NAME Generic)
 set(CMAKE_SYSTEM_PROCESSOR cortex-m0plus)
 set(CMAKE_C_COMPILER arm-none-eabi-gcc)

@@ -1,10 +1,11 @@
-# clang_module(OBJECT OPTION...): compiles the module for the target by Clang, beside the compiler of
-# the toolchain file.
+# compile_by_clang(OBJECT OPTION...): compiles the module for the target by Clang, beside the compiler
+# of the toolchain file.
 find_program(CLANG clang++-19)
 set(clang_for_target ${CLANG} --target=arm-none-eabi -mcpu=cortex-m0plus -ffreestanding)
-function(clang_module object)
+file(GLOB headers ${PROJECT_SOURCE_DIR}/include/*.h)
+function(compile_by_clang object)
   set(source ${PROJECT_SOURCE_DIR}/src/strutil.cpp)
-  add_custom_command(OUTPUT ${object} DEPENDS ${source} ${PROJECT_SOURCE_DIR}/include/strutil.h
+  add_custom_command(OUTPUT ${object} DEPENDS ${source} ${headers}
     COMMAND ${clang_for_target} -std=c++17 ${ARGN} -ffunction-sections -fdata-sections
       -I${PROJECT_SOURCE_DIR}/include -c ${source} -o ${object} VERBATIM)
 endfunction()

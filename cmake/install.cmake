@@ -11,12 +11,15 @@ install(EXPORT strutil NAMESPACE strutil:: DESTINATION ${package} FILE strutil-t
 write_basic_package_version_file(${PROJECT_BINARY_DIR}/strutil-config-version.cmake
   VERSION ${PROJECT_VERSION} COMPATIBILITY SameMajorVersion)
 # The version file goes on to say for which processor this is.
+include(cmake/processor.cmake)
+built_for(built_for)
 file(READ ${PROJECT_BINARY_DIR}/strutil-config-version.cmake version)
-configure_file(cmake/processor.cmake.in processor.cmake @ONLY)
-file(READ ${PROJECT_BINARY_DIR}/processor.cmake processor)
+configure_file(cmake/version.cmake.in version.cmake @ONLY)
+file(READ ${PROJECT_BINARY_DIR}/version.cmake processor)
 file(WRITE ${PROJECT_BINARY_DIR}/strutil-config-version.cmake "${version}${processor}")
 file(RELATIVE_PATH prefix /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
 configure_file(cmake/strutil.pc.in strutil.pc @ONLY)
-install(FILES cmake/strutil-config.cmake ${PROJECT_BINARY_DIR}/strutil-config-version.cmake
+install(FILES cmake/strutil-config.cmake cmake/processor.cmake
+  ${PROJECT_BINARY_DIR}/strutil-config-version.cmake
   DESTINATION ${package})
 install(FILES ${PROJECT_BINARY_DIR}/strutil.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)

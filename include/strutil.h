@@ -44,6 +44,9 @@
 #include "SubName.h"
 #include "base_types.h"
 
+/** The version of these files. */
+#define STRUTIL_VERSION "1.2.0"
+
 #ifdef __cplusplus
 #define STRUTIL_NOEXCEPT noexcept
 extern "C" {

@@ -63,7 +63,7 @@ namespace {
 // Narrow text is read and written as bytes, so that nothing depends on the sign of a plain char.
 using Byte = uint8_t;
 
-Byte* units(char* str) { return reinterpret_cast<Byte*>(str); }
+STRUTIL_INLINE Byte* units(char* str) { return reinterpret_cast<Byte*>(str); }
 const Byte* units(const char* str) { return reinterpret_cast<const Byte*>(str); }
 WCHAR* units(WCHAR* str) { return str; }
 const WCHAR* units(const WCHAR* str) { return str; }

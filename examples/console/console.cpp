@@ -13,7 +13,8 @@ constexpr int maxWords = lineSize / 2;
 
 constexpr char blanks[] = " ";  // a line has no others
 
-enum Key { endOfInput = 4, backspace = 8, deleteKey = 127 };  // Ctrl-D, and the two ways to erase
+// Ctrl-D, the two ways to erase, and what begins the sequence of an arrow key.
+enum Key { endOfInput = 4, bell = 7, backspace = 8, escape = 27, deleteKey = 127 };
 
 struct Setting {
   char name[nameSize];
@@ -274,12 +275,23 @@ void answer(char* line) {
 }
 
 // Reads a line as it is typed, shows it, and returns its length; -1 where the input ends. Of a line
-// that is too long, `line` holds, and the other side sees, only what fits.
+// that is too long, `line` holds, and the other side sees, only what fits; the rest rings the bell.
 int readLine(char* line) {
   static bool afterReturn = false;
   int length = 0;
+  bool inSequence = false;
+  int c = 0;
   for (;;) {
-    const int c = getchar();
+    const bool wasEscape = c == escape;
+    c = getchar();
+    if (wasEscape && c == '[') {
+      inSequence = true;
+      continue;
+    }
+    if (inSequence && c != EOF) {
+      inSequence = c < '@';
+      continue;
+    }
     const bool wasReturn = afterReturn;
     afterReturn = c == '\r';
     if (c == EOF || c == endOfInput) {
@@ -300,6 +312,8 @@ int readLine(char* line) {
       if (length < lineSize - 1) {
         line[length] = static_cast<char>(c == '\t' ? ' ' : c);
         putchar(line[length]);
+      } else {
+        putchar(bell);
       }
       ++length;
     }
@@ -313,6 +327,7 @@ int readLine(char* line) {
 
 int main() {
   char line[lineSize];
+  printf("A device console: try help\n");
   while (running) {
     printf("> ");
     const int length = readLine(line);
