@@ -4,5 +4,5 @@
 
 int main(int argc, char**) {
   const std::vector<char> memory(8);
-  return argc > 1 ? INT_MAX - 1 + argc : memory.data()[7 + argc];
+  return argc > 1 ? INT_MAX - 1 + argc : memory.data()[7 + argc];  // NOLINT
 }
