@@ -27,7 +27,7 @@ int peer_replace(const char* orig, const char* rep, const char* with, char* resu
   while ((ins = strstr(orig, rep))) {
     memcpy(out, orig, (size_t)(ins - orig));
     out += ins - orig;
-    memcpy(out, with, put);
+    memcpy(out, with, put);  // NOLINT(bugprone-not-null-terminated-result): more follows
     out += put;
     orig = ins + skip;
   }
