@@ -67,7 +67,7 @@ def measure(core, who, this, n, skew):
     elif isinstance(result, int):
         result &= 0xFFFFFFFF
         if is_peer and "Cmp" in name:  # of which the sign alone is given
-            found, result = bool(found) * (found >> 31 or 1), bool(result) * (result >> 31 or 1)
+            found, result = ((one > 0) - 2 * (one >> 31) for one in (found, result))
     if result not in (None, "walk") and found != result:
         sys.exit(f"{where}: gives {found}, not {result}")
     if written:

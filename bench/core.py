@@ -44,8 +44,8 @@ def pushed(op, size):
 
 
 class Core:
-    """A linked image. After call(): `cycles`, `result`, `stack` in bytes, and `reads_past`, whether
-    it read what the caller did not give, if that was asked for."""
+    """A linked image. After call(): `cycles`, `result` and `stack` in bytes; and `reads_past`, whether
+    a call since forget_given() read what the caller did not give, if that is watched."""
 
     def __init__(self, image, watches_reads=False):
         self.uc = Uc(UC_ARCH_ARM, UC_MODE_THUMB | UC_MODE_MCLASS)
@@ -62,7 +62,7 @@ class Core:
                     self.functions[symbol.name] = symbol["st_value"] | 1
                     self.sizes[symbol["st_value"] & ~1] = symbol["st_size"]
             self.starts = sorted(self.sizes)
-        self.given = bytearray(DATA_SIZE)
+        self.forget_given()
         self.uc.hook_add(UC_HOOK_BLOCK, self.on_block)
         if watches_reads:
             self.uc.hook_add(UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
@@ -117,11 +117,10 @@ class Core:
         self.given[address - DATA:address - DATA + len(data)] = bytes([1]) * len(data)
 
     def forget_given(self):
-        self.given = bytearray(DATA_SIZE)
+        self.given, self.reads_past = bytearray(DATA_SIZE), False
 
     def call(self, name, arguments):
         self.cycles = self.after = self.depth = self.stack = 0
-        self.reads_past = False
         for number, value in enumerate(arguments):
             self.uc.reg_write(UC_ARM_REG_R0 + number, value & 0xFFFFFFFF)
         self.uc.reg_write(UC_ARM_REG_SP, STACK_TOP)

@@ -11,8 +11,10 @@ from search import LONG, Raw, calls, nulls, terms_of
 
 def unit_of(name, index):
     """The bytes of a unit of an argument."""
-    if name in ("BytesToWords", "StrToWStr", "WStrToStr"):
-        return 2 - (index != (name != "WStrToStr"))
+    if name in ("BytesToWords", "StrToWStr"):
+        return 1 if index == 0 else 2
+    if name == "WStrToStr":
+        return 2 if index == 0 else 1
     return 2 if name.startswith("W") or name == "IntToWStr" else 1
 
 
@@ -79,6 +81,8 @@ def dearest(core, build, symbol, name, formula=None):
                              f"more than {formula}")
         key = tuple(sorted(lengths.items()))
         most[key] = max(most.get(key, 0), cycles)
+    if not most:
+        raise SystemExit(f"{build}: {name}: no call is searched")
     return most, stack
 
 
@@ -129,7 +133,10 @@ def fit(name, most):
         Path(work, "lp").write_text(program)
         subprocess.run(["glpsol", "--lp", "lp", "-w", "out"], cwd=work, check=True,
                        stdout=subprocess.DEVNULL)
-        solved = re.findall(r"^j \d+ \w+ (\S+)", Path(work, "out").read_text(), re.M)
+        solution = Path(work, "out").read_text()
+    if not re.search(r"^s bas \d+ \d+ f f ", solution, re.M):
+        raise SystemExit(f"{name}: no formula bounds all calls")
+    solved = re.findall(r"^j \d+ \w+ (\S+)", solution, re.M)
     factors = [math.ceil(float(one) * 4 - 1e-6) / 4 for one in solved[:len(terms)]]
     rest = max(cycles - Formula(terms[1:], factors[1:])(lengths) for lengths, cycles in points)
     return Formula(terms, [max(math.ceil(rest), 0), *factors[1:]])

@@ -71,7 +71,7 @@ def append(name):
 def find(name):
     other = str.swapcase if "I" in name else str
     for m in (0, 1, 2, 3, 4, 5, 8, 9, 16):
-        for end, case in product("ab", {str, other}):
+        for end, case in product("ab", dict.fromkeys((str, other))):
             pattern = "a" * (m - 1) + end if m else ""
             for units in shapes("a", "x"):
                 if m <= 2 or len(units) < 4 or set(units) <= {"a", units[-1]}:
