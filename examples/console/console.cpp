@@ -7,37 +7,18 @@
 namespace {
 
 constexpr int lineSize = 64;  // capacities, in units
-constexpr int textSize = 16;
 constexpr int nameSize = 8;
-constexpr int maxWords = lineSize / 2;
+constexpr int valueSize = 16;
 
-constexpr char blanks[] = " ";  // a line has no others
-
-// Ctrl-D, the two ways to erase, and what begins the sequence of an arrow key.
-enum Key { endOfInput = 4, bell = 7, backspace = 8, escape = 27, deleteKey = 127 };
+enum Key { ctrlD = 4, bell = 7, backspace = 8, escape = 27, erase = 127 };
 
 struct Setting {
   char name[nameSize];
-  char value[textSize];
+  char value[valueSize];
 };
 
 Setting settings[4];
 int settingCount = 0;
-
-struct Memory {
-  const char* name;
-  char text[textSize];
-};
-
-Memory memories[] = {{"a", ""}, {"b", ""}};
-
-Memory* findMemory(const char* name) {
-  for (Memory& memory : memories) {
-    if (StrICmp(memory.name, name) == 0) return &memory;
-  }
-  printf("no memory is called \"%s\": there are a and b\n", name);
-  return nullptr;
-}
 
 Setting* findSetting(const char* name) {
   for (int i = 0; i < settingCount; ++i) {
@@ -49,9 +30,9 @@ Setting* findSetting(const char* name) {
 // Cuts the first word off `text` and returns it; `text` moves on to what follows it.
 char* firstWord(char*& text) {
   int off = 0;
-  char* const word = StrToken(text, &off, blanks);
+  char* const word = StrToken(text, &off, " ");
   text += off;
-  StrTrim(text, blanks);
+  StrTrim(text, " ");
   return word;
 }
 
@@ -59,61 +40,21 @@ void length(char* text) { printf("%d\n", StrLen(text)); }
 
 void upper(char* text) { printf("%s\n", StrUpper(text)); }
 
-void lower(char* text) { printf("%s\n", StrLower(text)); }
-
 void find(char* text) {
   const char* const needle = firstWord(text);
   const char* const exact = StrStr(text, needle);
-  const char* const ignoringCase = StrIStr(text, needle);
-  if (*text == 0) {
-    printf("find \"%s\" in what?\n", needle);
-  } else if (exact) {
-    printf("at %d: %s\n", static_cast<int>(exact - text), exact);
-  } else if (ignoringCase) {
-    printf("in other letters at %d: %s\n", static_cast<int>(ignoringCase - text), ignoringCase);
+  const char* const found = exact ? exact : StrIStr(text, needle);
+  if (found) {
+    printf("%sat %d: %s\n", exact ? "" : "in other letters ", static_cast<int>(found - text),
+           found);
   } else {
-    printf("not found\n");
-  }
-}
-
-void showMemory(const Memory& memory, int wanted) {
-  printf("%s holds \"%s\"", memory.name, memory.text);
-  const int held = StrLen(memory.text);
-  if (held < wanted) printf(", %d cut: it holds no more than %d", wanted - held, textSize - 1);
-  printf("\n");
-}
-
-void keep(char* text) {
-  if (Memory* const memory = findMemory(firstWord(text))) {
-    StrCopyBuf(memory->text, textSize, text);
-    showMemory(*memory, StrLen(text));
-  }
-}
-
-void append(char* text) {
-  if (Memory* const memory = findMemory(firstWord(text))) {
-    const int wanted = StrLen(memory->text) + StrLen(text);
-    StrCatBuf(memory->text, textSize, text);
-    showMemory(*memory, wanted);
-  }
-}
-
-void compare(char*) {
-  const char* const a = memories[0].text;
-  const char* const b = memories[1].text;
-  const int exact = StrCmp(a, b);
-  const int position = exact < 0 ? -exact : exact;
-  if (exact == 0) {
-    printf("a and b are equal\n");
-  } else {
-    printf("a comes %s b by unit %d%s\n", exact < 0 ? "before" : "after", position - 1,
-           StrICmp(a, b) == 0 ? ", but only case differs" : "");
+    printf("\"%s\" is not found\n", needle);
   }
 }
 
 void words(char* text) {
-  char* word[maxWords];
-  const int count = StrSplit(text, " \t,;", word);
+  char* word[lineSize / 2];
+  const int count = StrSplit(text, " ,;", word);
   printf("%d:", count);
   for (int i = 0; i < count; ++i) printf(" [%s]", word[i]);
   printf("\n");
@@ -123,28 +64,34 @@ void set(char* text) {
   int off = 0;
   char* const name = StrToken(text, &off, "=");
   char* const value = text + off;
-  if (!StrChr("=", *text) && StrTrim(name, blanks) > 0 && StrTrim(value, blanks) > 0) {
-    Setting* setting = findSetting(name);
-    if (StrLen(name) >= nameSize || StrLen(value) >= textSize) {
-      printf("too long: a name has at most %d units, a value %d\n", nameSize - 1, textSize - 1);
-    } else if (!setting && settingCount == sizeof settings / sizeof *settings) {
-      printf("all %d settings are in use\n", settingCount);
-    } else {
-      if (!setting) {
-        setting = &settings[settingCount++];
-        StrCopy(setting->name, name);
-      }
-      StrCopy(setting->value, value);
-      printf("%s = %s\n", setting->name, setting->value);
-    }
-  } else {
+  if (!name || StrTrim(name, " ") == 0 || StrTrim(value, " ") == 0) {
     printf("set NAME = VALUE, please\n");
+    return;
+  }
+  Setting* setting = findSetting(name);
+  if (StrLen(name) >= nameSize || StrLen(value) >= valueSize) {
+    printf("too long: a name has at most %d units, a value %d\n", nameSize - 1, valueSize - 1);
+  } else if (!setting && settingCount == sizeof settings / sizeof *settings) {
+    printf("all %d settings are in use\n", settingCount);
+  } else {
+    if (!setting) {
+      setting = &settings[settingCount++];
+      StrCopy(setting->name, name);
+    }
+    StrCopy(setting->value, value);
+    printf("%s = %s\n", setting->name, setting->value);
   }
 }
 
-void get(char* name) {
-  if (const Setting* const setting = findSetting(name)) {
-    printf("%s = %s\n", setting->name, setting->value);
+void append(char* text) {
+  const char* const name = firstWord(text);
+  if (Setting* const setting = findSetting(name)) {
+    const int wanted = StrLen(setting->value) + StrLen(text);
+    StrCatBuf(setting->value, valueSize, text);
+    printf("%s = %s", setting->name, setting->value);
+    const int cut = wanted - StrLen(setting->value);
+    if (cut > 0) printf(", %d cut: a value has at most %d units", cut, valueSize - 1);
+    printf("\n");
   } else {
     printf("\"%s\" is not set\n", name);
   }
@@ -158,46 +105,34 @@ void fill(char* text) {
     StrCat(pattern, settings[i].name);
     StrCat(pattern, "}");
     const char* const from = filled[i % 2];
-    char* const to = filled[(i + 1) % 2];
     const int size = StrReplace(from, pattern, settings[i].value, nullptr) + 1;
     if (size > lineSize) {
       printf("does not fit: %d of %d units\n", size, lineSize);
       return;
     }
-    StrReplace(from, pattern, settings[i].value, to);
+    StrReplace(from, pattern, settings[i].value, filled[(i + 1) % 2]);
   }
   printf("%s\n", filled[settingCount % 2]);
 }
 
-// Reads a whole word as a decimal number, or says why it is none.
+// Reads a whole word as a decimal number.
 bool readNumber(const char* word, int& value) {
-  const bool negative = *word == '-';
-  const char* digits = word + (negative ? 1 : 0);
-  bool isNumber = *digits != 0;
-  for (const char* at = digits; *at != 0; ++at) isNumber = isNumber && StrChr("0123456789", *at);
-  if (!isNumber) {
-    printf("\"%s\" is no number\n", word);
-    return false;
-  }
-  while (*digits == '0' && digits[1] != 0) ++digits;
-  // What does not fit wraps, and then is written in another way than it was read.
+  char rest[lineSize];
+  StrCopyBuf(rest, lineSize, *word == '-' ? word + 1 : word);
+  const int digits = StrLen(rest);
   value = StrToInt(word);
-  char written[12];
-  IntToStr(value, written, 10);
-  const bool fits =
-      StrCmp(digits, written + (value < 0 ? 1 : 0)) == 0 && (value == 0 || negative == (value < 0));
-  if (!fits) printf("%s does not fit: a number has 32 bits\n", word);
-  return fits;
+  return digits > 0 && digits < 10 && StrTrim(rest, "0123456789") == 0;
 }
 
 void number(char* text) {
   int value = 0;
   int radix = 10;
-  if (!readNumber(firstWord(text), value) || (*text != 0 && !readNumber(text, radix))) return;
-  if (radix < 2 || radix > 36) {
+  char digits[34];
+  if (!readNumber(firstWord(text), value) || (*text != 0 && !readNumber(text, radix))) {
+    printf("a number has 1 to 9 digits\n");
+  } else if (radix < 2 || radix > 36) {
     printf("a radix is 2 to 36\n");
   } else {
-    char digits[34];
     printf("%s\n", IntToStr(value, digits, radix));
   }
 }
@@ -211,17 +146,6 @@ void label(char* text) {
   printf("%d units: %s\n", WStrLen(wide), shown);
 }
 
-void dump(char* text) {
-  WORD raw[lineSize];
-  const int count = StrLen(text);
-  BytesToWords(text, raw, count);
-  for (int i = 0; i < count; ++i) printf("%04x%s", raw[i], i + 1 < count ? " " : "\n");
-}
-
-bool running = true;
-
-void quit(char*) { running = false; }
-
 void help(char*);
 
 struct Command {
@@ -233,45 +157,38 @@ struct Command {
 constexpr Command commands[] = {
     {"length", "TEXT", length},
     {"upper", "TEXT", upper},
-    {"lower", "TEXT", lower},
     {"find", "NEEDLE TEXT", find},
-    {"keep", "a|b TEXT", keep},
-    {"append", "a|b TEXT", append},
-    {"compare", "", compare},
     {"words", "TEXT", words},
     {"set", "NAME = VALUE", set},
-    {"get", "NAME", get},
+    {"append", "NAME TEXT", append},
     {"fill", "TEXT WITH ${NAME}", fill},
     {"number", "VALUE [RADIX]", number},
     {"label", "TEXT", label},
-    {"dump", "TEXT", dump},
     {"help", "", help},
-    {"quit", "", quit},
+    {"quit", "or Ctrl-D", nullptr},
 };
 
 void help(char*) {
   for (const Command& command : commands) {
     printf(*command.arguments == 0 ? "%s\n" : "%s %s\n", command.name, command.arguments);
   }
-  printf("Ctrl-D quits, too\n");
 }
 
-void answer(char* line) {
+// Returns whether the session goes on.
+bool answer(char* line) {
   const char* const name = firstWord(line);
-  if (!name) {
-    printf("nothing to do; try help\n");
-    return;
-  }
   for (const Command& command : commands) {
-    if (StrICmp(command.name, name) != 0) continue;
+    if (!name || StrICmp(command.name, name) != 0) continue;
+    if (!command.run) return false;
     if (*line == 0 && *command.arguments != 0) {
       printf("an argument is missing: %s %s\n", command.name, command.arguments);
     } else {
       command.run(line);
     }
-    return;
+    return true;
   }
-  printf("no command is called \"%s\"; try help\n", name);
+  printf("there is no command \"%s\"; try help\n", name ? name : "");
+  return true;
 }
 
 // Reads a line as it is typed, shows it, and returns its length; -1 where the input ends. Of a line
@@ -279,35 +196,23 @@ void answer(char* line) {
 int readLine(char* line) {
   static bool afterReturn = false;
   int length = 0;
-  bool inSequence = false;
-  int c = 0;
-  for (;;) {
-    const bool wasEscape = c == escape;
+  bool inSequence = false;  // of an arrow key, say
+  for (int c = 0;;) {
+    const int before = c;
     c = getchar();
-    if (wasEscape && c == '[') {
-      inSequence = true;
-      continue;
-    }
-    if (inSequence && c != EOF) {
-      inSequence = c < '@';
-      continue;
-    }
-    const bool wasReturn = afterReturn;
+    const bool endsReturn = c == '\n' && afterReturn;
     afterReturn = c == '\r';
-    if (c == EOF || c == endOfInput) {
-      if (length == 0) return -1;
-      break;
-    }
-    if (c == '\n' && wasReturn) continue;
-    if (c == '\r' || c == '\n') break;
-    if (c == backspace || c == deleteKey) {
+    if (endsReturn) continue;
+    if (length == 0 && (c == EOF || c == ctrlD)) return -1;
+    if (c == EOF || c == ctrlD || c == '\r' || c == '\n') break;
+    if (inSequence || (c == '[' && before == escape)) {
+      inSequence = c == '[' || c < '@';
+    } else if (c == backspace || c == erase) {
       if (length == 0) continue;
-      --length;
-      if (length < lineSize - 1) {
-        // The bytes of one character that follow its first are 128 to 191.
-        while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
-        printf("\b \b");
-      }
+      if (--length >= lineSize - 1) continue;
+      // The bytes of one character that follow its first are 128 to 191.
+      while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
+      printf("\b \b");
     } else if (c >= ' ' || c == '\t') {
       if (length < lineSize - 1) {
         line[length] = static_cast<char>(c == '\t' ? ' ' : c);
@@ -328,17 +233,14 @@ int readLine(char* line) {
 int main() {
   char line[lineSize];
   printf("A device console: try help\n");
-  while (running) {
+  for (bool running = true; running;) {
     printf("> ");
     const int length = readLine(line);
-    if (length < 0) {
-      printf("\n");
-      break;
-    }
     if (length >= lineSize) {
       printf("%d units are too many: a line has at most %d\n", length, lineSize - 1);
     } else {
-      answer(line);
+      if (length < 0) printf("\n");
+      running = length >= 0 && answer(line);
     }
   }
   printf("bye\n");
