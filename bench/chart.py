@@ -3,19 +3,17 @@ SHOWN = [("StrLen", ""), ("StrCopy", ""), ("StrCopyBuf", ""), ("StrCat", ""), ("
          ("StrCmp", "equal"), ("StrICmp", "same text"), ("StrUpper", "mixed text"),
          ("StrStr", "found late"), ("StrIStr", "found late"), ("StrToken", "to the end"),
          ("StrReplace", "one unit by two")]
-SERIES = [("strutil", "#1b6ca8"), ("newlib", "#d9822b"), ("picolibc", "#5a9e6f"), ("loop", "#999999")]
-NAMES = {"picolibc": "picolibc, built for speed", "loop": "the obvious loop"}
-MOST = 60  # cycles a unit: what is more is cut, and told
-UNIT = 7.5  # pixels
+SERIES = [("", "strutil", "#1b6ca8"), ("newlib", "newlib", "#d9822b"),
+          ("picolibc", "picolibc, built for speed", "#5a9e6f"), ("loop", "the obvious loop", "#999999")]
+MOST, UNIT = 60, 7.5  # cycles a unit, of which what is more is cut, and told; pixels of one
 
 
 def chart(cells, past, ours):
     lines, y = [], 76
     for name, about in SHOWN:
         lines.append(f'<text x="132" y="{y + 25}" text-anchor="end">{name}</text>')
-        for who, color in SERIES:
-            key = ours if who == "strutil" else who
-            each = cells[key, (name, about), 256, False] / 256
+        for who, _, color in SERIES:
+            each = cells[who or ours, (name, about), 256, False] / 256
             fill = f'fill="#fff" stroke="{color}"' if (who, name) in past else f'fill="{color}"'
             lines.append(f'<rect x="140" y="{y}" width="{min(each, MOST) * UNIT:.1f}" height="9" {fill}/>')
             end = 144 + min(each, MOST) * UNIT
@@ -23,8 +21,7 @@ def chart(cells, past, ours):
             y += 11
         y += 10
     x = 140
-    for who, color in SERIES:
-        name = NAMES.get(who, who)
+    for _, name, color in SERIES:
         lines.append(f'<rect x="{x}" y="42" width="12" height="12" fill="{color}"/>'
                      f'<text x="{x + 17}" y="53">{name}</text>')
         x += 36 + 7 * len(name)

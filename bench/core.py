@@ -2,11 +2,9 @@
 Manual's timing table, with zero wait states. What a block of instructions costs is worked out once."""
 from bisect import bisect
 
+import unicorn
 from elftools.elf.elffile import ELFFile
-from unicorn import (UC_ARCH_ARM, UC_HOOK_BLOCK, UC_HOOK_MEM_READ, UC_HOOK_MEM_WRITE, UC_MODE_MCLASS,
-                     UC_MODE_THUMB, Uc, UcError)
-from unicorn.arm_const import (UC_ARM_REG_LR, UC_ARM_REG_PC, UC_ARM_REG_R0, UC_ARM_REG_SP,
-                               UC_CPU_ARM_CORTEX_M0)
+from unicorn import arm_const as arm
 
 RAM, RAM_SIZE = 0x20000000, 0x40000
 STACK_TOP = RAM + RAM_SIZE
@@ -32,15 +30,13 @@ def cost(op, size):
     return 1
 
 
-def pushed(op, size):
+def pushed(op):
     """By how many bytes an instruction lowers the stack pointer."""
-    if size == 2 and op & 0xFE00 == 0xB400:
-        return 4 * (op & 0x1FF).bit_count()
-    if size == 2 and op & 0xFE00 == 0xBC00:
-        return -4 * (op & 0x1FF).bit_count()
-    if size == 2 and op & 0xFF00 == 0xB000:
+    if op & 0xF600 == 0xB400:  # PUSH, POP
+        return (op & 0x1FF).bit_count() * (-4 if op & 0x800 else 4)
+    if op & 0xFF00 == 0xB000:  # SUB, ADD
         return (op & 0x7F) * (4 if op & 0x80 else -4)
-    return None if size == 2 and op & 0xFF87 in (0x4485, 0x4685) else 0  # unknown: ADD, MOV to SP
+    return float("inf") if op & 0xFF87 in (0x4485, 0x4685) else 0  # ADD, MOV to SP: not to be told
 
 
 class Core:
@@ -48,11 +44,11 @@ class Core:
     a call since forget_given() read what the caller did not give, if that is watched."""
 
     def __init__(self, image, watches_reads=False):
-        self.uc = Uc(UC_ARCH_ARM, UC_MODE_THUMB | UC_MODE_MCLASS)
-        self.uc.ctl_set_cpu_model(UC_CPU_ARM_CORTEX_M0)
+        self.uc = unicorn.Uc(unicorn.UC_ARCH_ARM, unicorn.UC_MODE_THUMB | unicorn.UC_MODE_MCLASS)
+        self.uc.ctl_set_cpu_model(arm.UC_CPU_ARM_CORTEX_M0)
         self.uc.mem_map(0, 0x100000)
         self.uc.mem_map(RAM, RAM_SIZE)
-        self.functions, self.sizes, self.blocks, self.entered = {}, {}, {}, set()
+        self.functions, self.sizes, self.blocks = {}, [], {}
         with open(image, "rb") as file:
             elf = ELFFile(file)
             for segment in elf.iter_segments("PT_LOAD"):
@@ -60,28 +56,23 @@ class Core:
             for symbol in elf.get_section_by_name(".symtab").iter_symbols():
                 if symbol["st_info"]["type"] == "STT_FUNC" and symbol["st_shndx"] != "SHN_UNDEF":
                     self.functions[symbol.name] = symbol["st_value"] | 1
-                    self.sizes[symbol["st_value"] & ~1] = symbol["st_size"]
-            self.starts = sorted(self.sizes)
+                    self.sizes.append((symbol["st_value"] & ~1, symbol["st_size"]))
+        self.sizes.sort()
         self.forget_given()
-        self.uc.hook_add(UC_HOOK_BLOCK, self.on_block)
+        self.uc.hook_add(unicorn.UC_HOOK_BLOCK, self.on_block)
         if watches_reads:
-            self.uc.hook_add(UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
-            self.uc.hook_add(UC_HOOK_MEM_WRITE, self.on_write, None, DATA, DATA + DATA_SIZE - 1)
+            self.uc.hook_add(unicorn.UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
+            self.uc.hook_add(unicorn.UC_HOOK_MEM_WRITE, self.on_write, None, DATA, DATA + DATA_SIZE - 1)
 
     def analyse(self, address, size):
         code = bytes(self.uc.mem_read(address, size))
-        cycles = depth = deepest = at = 0
-        op = width = 0
+        cycles = depth = deepest = at = op = width = 0
         while at < size:
             op = int.from_bytes(code[at:at + 2], "little")
             width = 4 if op >= 0xE800 else 2
             cycles += cost(op, width)
-            lowered = pushed(op, width)
-            if lowered is None:
-                deepest = None
-            elif deepest is not None:
-                depth += lowered
-                deepest = max(deepest, depth)
+            depth += pushed(op)
+            deepest = max(deepest, depth)
             at += width
         is_conditional = width == 2 and op & 0xF000 == 0xD000 and op & 0x0E00 != 0x0E00
         return cycles, depth, deepest, address + size if is_conditional else 0
@@ -91,19 +82,17 @@ class Core:
         if block is None:
             block = self.blocks[address, size] = self.analyse(address, size)
         cycles, depth, deepest, after = block
-        self.entered.add(address)
-        self.cycles += cycles if self.after in (0, address) else cycles + 1  # a taken branch
+        self.cycles += cycles
+        if self.after and self.after != address:
+            self.cycles += 1  # a taken branch
         self.after = after
-        if deepest is None:
-            self.stack = self.depth = float("inf")  # not to be told
-        elif self.depth + deepest > self.stack:
-            self.stack = self.depth + deepest
+        if deepest:
+            self.stack = max(self.stack, self.depth + deepest)
         self.depth += depth
 
     def parts(self):
-        """The sizes of the functions that ran, by their addresses."""
-        starts = {self.starts[bisect(self.starts, address) - 1] for address in self.entered}
-        return {start: self.sizes[start] for start in starts}
+        """The functions that ran since the blocks were cleared, as pairs of address and size."""
+        return {self.sizes[bisect(self.sizes, (address, 0xFFFF)) - 1] for address, _ in self.blocks}
 
     def on_read(self, _uc, _access, address, size, _value, _):
         if 0 in self.given[address - DATA:address - DATA + size]:
@@ -122,13 +111,13 @@ class Core:
     def call(self, name, arguments):
         self.cycles = self.after = self.depth = self.stack = 0
         for number, value in enumerate(arguments):
-            self.uc.reg_write(UC_ARM_REG_R0 + number, value & 0xFFFFFFFF)
-        self.uc.reg_write(UC_ARM_REG_SP, STACK_TOP)
-        self.uc.reg_write(UC_ARM_REG_LR, RETURN | 1)
+            self.uc.reg_write(arm.UC_ARM_REG_R0 + number, value & 0xFFFFFFFF)
+        self.uc.reg_write(arm.UC_ARM_REG_SP, STACK_TOP)
+        self.uc.reg_write(arm.UC_ARM_REG_LR, RETURN | 1)
         try:
             self.uc.emu_start(self.functions[name], RETURN, count=0)
-        except UcError as error:
+        except unicorn.UcError as error:
             raise RuntimeError(f"{name}({arguments}): {error}") from error
-        if self.uc.reg_read(UC_ARM_REG_PC) != RETURN:
+        if self.uc.reg_read(arm.UC_ARM_REG_PC) != RETURN:
             raise RuntimeError(f"{name}({arguments}): does not return")
-        self.result = self.uc.reg_read(UC_ARM_REG_R0)
+        self.result = self.uc.reg_read(arm.UC_ARM_REG_R0)

@@ -1,6 +1,12 @@
 /* What a C library has no single function for, put together from those that it has. */
 #include <string.h>
 
+#if defined(__PICOLIBC_VERSION__)
+const char library[] = "picolibc " __PICOLIBC_VERSION__;
+#else
+const char library[] = "newlib " _NEWLIB_VERSION;
+#endif
+
 int peer_split(char* str, const char* dlmt, char** wrd) {
   char* state;
   int num = 0;
@@ -23,13 +29,11 @@ int peer_replace(const char* orig, const char* rep, const char* with, char* resu
   const size_t skip = strlen(rep);
   const size_t put = strlen(with);
   char* out = result;
-  const char* ins;
-  while ((ins = strstr(orig, rep))) {
+  for (const char* ins; (ins = strstr(orig, rep)); orig = ins + skip) {
     memcpy(out, orig, (size_t)(ins - orig));
     out += ins - orig;
     memcpy(out, with, put);  // NOLINT(bugprone-not-null-terminated-result): more follows
     out += put;
-    orig = ins + skip;
   }
   strcpy(out, orig);
   return (int)(out - result) + (int)strlen(out);

@@ -1,117 +1,71 @@
 """Calls that others can make as well, and what must come of them by Python's own means."""
-from search import OUT, Raw, text
+from typing import Callable, NamedTuple
+
+from search import INT, OUT
 
 PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the blinds "
          "by 9. ") * 3
+DIGITS = "1234567890"
 END = "\0"
+NULL = None, 0
 
 
-def at(index):
-    """As a result: a pointer to this unit of the first argument that is a text, -1 for null."""
-    return "at", index
-
-
-def row(name, about, call, peer=None, order=None, sizes=(4, 16, 64, 256)):
-    """call(n) gives the arguments, the result or None, and the index and units of what is written.
-    `order` says which of the arguments, or which numbers, a C library takes."""
-    return name, about, call, peer, order, sizes
-
-
-def compared(n, other, *count, differs=None):
-    one, two = PROSE[:n], other(PROSE[:n])
-    if differs is not None:
-        two = two[:differs] + "~" + two[differs + 1:]
-    return (text(one), text(two), *count), 0 if differs is None else -differs - 1, None
-
-
-def copied(n, *arguments):
-    return arguments, None, (0, PROSE[:n] + END)
-
-
-def appended(n, *bounds, first=False):
-    dst, src = text(PROSE[:n // 2]), text(PROSE[n // 2:n])
-    return (dst, *bounds[:first], src, *bounds[first:]), None, (0, PROSE[:n] + END)
-
-
-def mapped(n, before, after):
-    return (text(before(PROSE[:n])),), at(0), (0, after(PROSE[:n]) + END)
-
-
-def line(n):
-    return PROSE[:n].replace(" ", ",")
-
-
-def trimmed(n):
-    blanks, kept = " " * (n // 4), PROSE[:n - n // 4 * 2].replace(" ", "_")
-    return (text(blanks + kept + blanks), text(" \t")), len(kept), (0, kept + END)
-
-
-def replaced(n):
-    after = PROSE[:n].replace(" ", "__")
-    return (text(PROSE[:n]), text(" "), text("__"), OUT), len(after), (3, after + END)
-
-
-def escaped(n, unit, shown):
-    return (text(unit * n), OUT, len(shown) * n + 1), at(None), (1, shown * n + END)
+class Row(NamedTuple):
+    """make(n, t), t being prose of n units, gives the arguments; the result, which is a number, the index
+    of an argument and of the unit of it that a pointer points to, or None; and the index and the units of
+    what is written, or None. `order` says which of the arguments a C library takes."""
+    name: str
+    about: str
+    make: Callable
+    peer: str = ""
+    order: tuple = ()
+    sizes: tuple = (4, 16, 64, 256)
 
 
 ROWS = [
-    row("StrLen", "", lambda n: ((text(PROSE[:n]),), n, None), "strlen"),
-    row("StrUpper", "mixed text", lambda n: mapped(n, str, str.upper), "strupr"),
-    row("StrUpper", "all to change", lambda n: (
-        (text(("abc" * n)[:n]),), at(0), (0, ("ABC" * n)[:n] + END)), "strupr"),
-    row("StrLower", "mixed text", lambda n: mapped(n, str, str.lower), "strlwr"),
-    row("StrCopy", "", lambda n: copied(n, OUT, text(PROSE[:n])), "strcpy"),
-    row("StrCopyBuf", "", lambda n: copied(n, OUT, n + 1, text(PROSE[:n])), "strlcpy", (0, 2, 1)),
-    row("StrNCopy", "ended by the text", lambda n: copied(n, OUT, text(PROSE[:n]), n + 4), "strncpy"),
-    row("StrNCopy", "ended by its count", lambda n: (
-        (OUT, text(PROSE[:n + 4]), n), None, (0, PROSE[:n])), "strncpy"),
-    row("StrCat", "", lambda n: appended(n), "strcat"),
-    row("StrCatBuf", "", lambda n: appended(n, n + 1, first=True), "strlcat", (0, 2, 1)),
-    row("WStrNCat", "", lambda n: appended(n, n)),
-    row("WStrNCatBuf", "", lambda n: appended(n, n + 1, n, first=True)),
-    row("StrChr", "not found", lambda n: ((text(PROSE[:n]), ord("~")), at(-1), None), "strchr"),
-    row("StrStr", "found late", lambda n: (
-        (text(PROSE[:n - 4] + "dawn"), text("dawn")), at(n - 4), None), "strstr"),
-    row("StrStr", "first unit repeated", lambda n: ((text("a" * n), text("ab")), at(-1), None),
-        "strstr"),
-    row("StrIStr", "found late", lambda n: (
-        (text(PROSE[:n - 4] + "dawn"), text("DaWn")), at(n - 4), None), "strcasestr"),
-    row("StrIStr", "first unit repeated", lambda n: ((text("a" * n), text("Ab")), at(-1), None),
-        "strcasestr"),
-    row("StrNCmp", "ended by the text", lambda n: compared(n, str, n + 4), "strncmp"),
-    row("StrNCmp", "ended by its count", lambda n: compared(n, str, n), "strncmp"),
-    row("StrNICmp", "other case", lambda n: compared(n, str.swapcase, n + 4), "strncasecmp"),
-    row("StrCmp", "equal", lambda n: compared(n, str), "strcmp"),
-    row("StrCmp", "first unit differs", lambda n: compared(n, str, differs=0), "strcmp", None, (16,)),
-    row("StrCmp", "last unit differs", lambda n: compared(n, str, differs=n - 1), "strcmp"),
-    row("StrICmp", "same text", lambda n: compared(n, str), "strcasecmp"),
-    row("StrICmp", "other case", lambda n: compared(n, str.swapcase), "strcasecmp"),
-    # Called until it gives null; a C library takes the text at the first call only.
-    row("StrToken", "to the end", lambda n: (
-        (text(line(n)), Raw([0]), text(",")), "walk", (0, line(n).replace(",", END))), "strtok_r",
+    Row("StrLen", "", lambda n, t: ((t,), n, None), "strlen"),
+    Row("StrUpper", "mixed text", lambda n, t: ((t,), (0, 0), (0, t.upper() + END)), "strupr"),
+    Row("StrUpper", "all to change", lambda n, t: (("a" * n,), (0, 0), (0, "A" * n + END)), "strupr"),
+    Row("StrLower", "mixed text", lambda n, t: ((t,), (0, 0), (0, t.lower() + END)), "strlwr"),
+    Row("StrCopy", "", lambda n, t: ((OUT, t), None, (0, t + END)), "strcpy"),
+    Row("StrCopyBuf", "", lambda n, t: ((OUT, n + 1, t), None, (0, t + END)), "strlcpy", (0, 2, 1)),
+    Row("StrNCopy", "ended by the text", lambda n, t: ((OUT, t, n + 4), None, (0, t + END)), "strncpy"),
+    Row("StrNCopy", "ended by its count", lambda n, t: ((OUT, t + "more", n), None, (0, t)), "strncpy"),
+    Row("StrCat", "", lambda n, t: ((t[:n // 2], t[n // 2:]), None, (0, t + END)), "strcat"),
+    Row("StrCatBuf", "", lambda n, t: ((t[:n // 2], n + 1, t[n // 2:]), None, (0, t + END)), "strlcat",
         (0, 2, 1)),
-    row("StrSplit", "", lambda n: (
-        (text(line(n)), text(","), OUT), len([word for word in line(n).split(",") if word]),
-        (0, line(n).replace(",", END))), "peer_split"),
-    row("StrTrim", "a quarter at each end", trimmed, "peer_trim"),
-    row("StrReplace", "one unit by two", replaced, "peer_replace"),
-    row("IntToStr", "radix 10", lambda n: (
-        (int("1234567890"[:n]), OUT, 10), at(None), (1, "1234567890"[:n] + END)), "itoa", None,
-        (1, 4, 10)),
-    row("StrToInt", "", lambda n: ((text("1234567890"[:n]),), int("1234567890"[:n]), None), "atoi",
-        None, (1, 4, 10)),
-    row("BytesToWords", "", lambda n: ((text(PROSE[:n]), OUT, n), None, (1, PROSE[:n]))),
-    row("StrToWStr", "", lambda n: ((text(PROSE[:n]), OUT, n + 1), at(None), (1, PROSE[:n] + END))),
-    row("WStrToStr", "printable", lambda n: escaped(n, "x", "x")),
-    row("WStrToStr", "escaped", lambda n: escaped(n, "\u4e2d", "&(0x4e2d)")),
-    row("WStrToWords", "", lambda n: ((text(PROSE[:n]), OUT, n), None, (1, PROSE[:n]))),
+    Row("WStrNCat", "", lambda n, t: ((t[:n // 2], t[n // 2:], n), None, (0, t + END))),
+    Row("WStrNCatBuf", "", lambda n, t: ((t[:n // 2], n + 1, t[n // 2:], n), None, (0, t + END))),
+    Row("StrChr", "not found", lambda n, t: ((t, ord("~")), NULL, None), "strchr"),
+    Row("StrStr", "found late", lambda n, t: ((t[:-4] + "dawn", "dawn"), (0, n - 4), None), "strstr"),
+    Row("StrStr", "first unit repeated", lambda n, t: (("a" * n, "ab"), NULL, None), "strstr"),
+    Row("StrIStr", "found late", lambda n, t: ((t[:-4] + "dawn", "DaWn"), (0, n - 4), None), "strcasestr"),
+    Row("StrIStr", "first unit repeated", lambda n, t: (("a" * n, "Ab"), NULL, None), "strcasestr"),
+    Row("StrNCmp", "ended by the text", lambda n, t: ((t, t, n + 4), 0, None), "strncmp"),
+    Row("StrNCmp", "ended by its count", lambda n, t: ((t, t, n), 0, None), "strncmp"),
+    Row("StrNICmp", "other case", lambda n, t: ((t, t.swapcase(), n + 4), 0, None), "strncasecmp"),
+    Row("StrCmp", "equal", lambda n, t: ((t, t), 0, None), "strcmp"),
+    Row("StrCmp", "first unit differs", lambda n, t: ((t, "~" + t), -1, None), "strcmp", (), (16,)),
+    Row("StrCmp", "last unit differs", lambda n, t: ((t, t[:-1] + "~"), -n, None), "strcmp"),
+    Row("StrICmp", "same text", lambda n, t: ((t, t), 0, None), "strcasecmp"),
+    Row("StrICmp", "other case", lambda n, t: ((t, t.swapcase()), 0, None), "strcasecmp"),
+    # Called until it gives null; a C library takes the text at the first call only.
+    Row("StrToken", "to the end", lambda n, t: ((t, INT, " "), "walk", (0, t.replace(" ", END))), "strtok_r",
+        (0, 2, 1)),
+    Row("StrSplit", "", lambda n, t: ((t, " ", INT), len(t.split()), (0, t.replace(" ", END))), "peer_split"),
+    Row("StrTrim", "a quarter at each end", lambda n, t: (
+        (f"{'x' * (n // 2):^{n}}", " \t"), n // 2, (0, "x" * (n // 2) + END)), "peer_trim"),
+    Row("StrReplace", "one unit by two", lambda n, t: (
+        (t, " ", "__", OUT), n + t.count(" "), (3, t.replace(" ", "__") + END)), "peer_replace"),
+    Row("IntToStr", "radix 10", lambda n, t: (
+        (int(DIGITS[:n]), OUT, 10), (1, 0), (1, DIGITS[:n] + END)), "itoa", (), (1, 4, 10)),
+    Row("StrToInt", "", lambda n, t: ((DIGITS[:n],), int(DIGITS[:n]), None), "atoi", (), (1, 4, 10)),
+    Row("BytesToWords", "", lambda n, t: ((t, OUT, n), None, (1, t))),
+    Row("StrToWStr", "", lambda n, t: ((t, OUT, n + 1), (1, 0), (1, t + END))),
+    Row("WStrToStr", "printable", lambda n, t: (("x" * n, OUT, n + 1), (1, 0), (1, "x" * n + END))),
+    Row("WStrToStr", "escaped", lambda n, t: (
+        ("\u4e2d" * n, OUT, 9 * n + 1), (1, 0), (1, "&(0x4e2d)" * n + END))),
+    Row("WStrToWords", "", lambda n, t: ((t, OUT, n), None, (1, t))),
 ]
-
-
-def wide(name):
-    return {"IntToStr": "IntToWStr"}.get(name, "W" + name)
-
-
-ROWS += [row(wide(name), about, call, None, None, sizes)
-         for name, about, call, peer, _, sizes in ROWS if peer]
+ROWS += [row._replace(name={"IntToStr": "IntToWStr"}.get(row.name, "W" + row.name), peer="")
+         for row in ROWS if row.peer]
