@@ -68,27 +68,31 @@ void checkCopies(const Units& given, int n) {
 }
 
 template <typename Unit>
-void checkAppends(const Units& before, const Units& given, int n, int num) {
+void checkAppends(const Units& before, const Units& given, int n) {
   const Units dst = lift<Unit>(before);
   const Units src = lift<Unit>(given);
   Buffer<Unit> whole(dst + u'\0', dst.size() + src.size() + 1);
   twin::Cat<Unit>(whole.get(), Text<Unit>(src).get());
   whole.check(callOf<Unit>("StrCat", dst, src), dst + src + u'\0');
-  Units expected = model::nCatBuf(dst, n, src, model::noLimit) + u'\0';
+  const Units expected = model::nCatBuf(dst, n, src, model::noLimit) + u'\0';
   const int room = n < 1 ? 0 : n - 1 - static_cast<int>(dst.size());
   Buffer<Unit> fitted(dst + u'\0', expected.size());
   twin::CatBuf<Unit>(fitted.get(), n, Counted<Unit>(src, room).get());
   fitted.check(callOf<Unit>("StrCatBuf", dst, "n", n, "src", src), expected);
-  if constexpr (isWide<Unit>) {
-    expected = dst + model::take(src, num) + u'\0';
-    Buffer<Unit> counted(dst + u'\0', expected.size());
-    WStrNCat(counted.get(), Counted<Unit>(src, num).get(), num);
-    counted.check(callOf<Unit>("StrNCat", dst, src, "num", num), expected);
-    expected = model::nCatBuf(dst, n, src, num) + u'\0';
-    Buffer<Unit> both(dst + u'\0', expected.size());
-    WStrNCatBuf(both.get(), n, Counted<Unit>(src, std::min(num, room)).get(), num);
-    both.check(callOf<Unit>("StrNCatBuf", dst, "n", n, "src", src, "num", num), expected);
-  }
+}
+
+inline void checkCountedAppends(const Units& before, const Units& given, int n, int num) {
+  const Units dst = lift<WCHAR>(before);
+  const Units src = lift<WCHAR>(given);
+  Units expected = dst + model::take(src, num) + u'\0';
+  Buffer<WCHAR> counted(dst + u'\0', expected.size());
+  WStrNCat(counted.get(), Counted<WCHAR>(src, num).get(), num);
+  counted.check(callOf<WCHAR>("StrNCat", dst, src, "num", num), expected);
+  expected = model::nCatBuf(dst, n, src, num) + u'\0';
+  const int room = n < 1 ? 0 : n - 1 - static_cast<int>(dst.size());
+  Buffer<WCHAR> both(dst + u'\0', expected.size());
+  WStrNCatBuf(both.get(), n, Counted<WCHAR>(src, std::min(num, room)).get(), num);
+  both.check(callOf<WCHAR>("StrNCatBuf", dst, "n", n, "src", src, "num", num), expected);
 }
 
 // Searching and comparison

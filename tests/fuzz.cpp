@@ -43,7 +43,8 @@ void checkOne(FuzzedDataProvider& data) {
     case 1:
       return checkCopies<Unit>(a, n);
     case 2:
-      return checkAppends<Unit>(b, a, n, m);
+      if (isWide<Unit>) checkCountedAppends(b, a, n, m);
+      return checkAppends<Unit>(b, a, n);
     case 3:
       return checkFindUnit<Unit>(a, b.empty() ? u'\0' : b[0]);
     case 4:

@@ -17,6 +17,7 @@ inline const Units smallLetters = u"abcdefghijklmnopqrstuvwxyz";
 
 inline Units exchange(Units text, const Units& from, const Units& to) {
   for (char16_t& unit : text) {
+    if (unit < from.front() || unit > from.back()) continue;
     const size_t letter = from.find(unit);
     if (letter != Units::npos) unit = to[letter];
   }

@@ -2,6 +2,7 @@
 // alignments, and what is told of a failure.
 #pragma once
 
+#include <algorithm>
 #include <string>
 #include <type_traits>
 #include <vector>
@@ -117,33 +118,34 @@ class Memory {
   int indexOf(const Unit* unit) { return unit ? static_cast<int>(unit - get()) : -1; }
 
  protected:
-  Memory(const Units& units, size_t size)
-      : start(nextNumber() % 4), before(canaries(start) + units + canaries(size - units.size())) {
-    if (nextNumber() % 2 == 0 || before.empty()) before += canaries(3);
-    memory.assign(before.begin(), before.end());
+  Memory(const Units& units, size_t size) : start(nextNumber() % 4) {
+    const unsigned some = nextNumber();
+    const size_t whole = start + size + (some % 2 == 0 || start + size == 0 ? 3 : 0);
+    before.reserve(whole);
+    constexpr Unit canaries[] = {'a', 'A', ',', ' '};
+    while (before.size() < whole) before.push_back(canaries[(some + before.size()) / 2 % 4]);
+    std::copy(units.begin(), units.end(), before.begin() + static_cast<std::ptrdiff_t>(start));
+    memory = before;
   }
 
   // Checks that the units are now those, and that no other has changed.
   template <typename Call>
   void check(const Call& call, const Units& written) {
-    Units expected = before;
-    for (size_t i = 0; i < written.size(); ++i) {
-      expected[start + i] = static_cast<std::make_unsigned_t<Unit>>(written[i]);
-    }
-    Units now;
-    for (const Unit unit : memory) now += static_cast<std::make_unsigned_t<Unit>>(unit);
-    expect(call, now, expected);
+    if (written.empty() && memory == before) return;
+    std::vector<Unit> wanted = before;
+    std::copy(written.begin(), written.end(), wanted.begin() + static_cast<std::ptrdiff_t>(start));
+    if (memory != wanted) expect(call, units(memory), units(wanted));
   }
 
  private:
-  static Units canaries(size_t count) {
+  static Units units(const std::vector<Unit>& memory) {
     Units units;
-    while (units.size() < count) units += u"aA, "[nextNumber() % 4];
+    for (const Unit unit : memory) units += static_cast<std::make_unsigned_t<Unit>>(unit);
     return units;
   }
 
   size_t start;
-  Units before;
+  std::vector<Unit> before;
   std::vector<Unit> memory;
 };
 
