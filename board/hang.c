@@ -11,5 +11,6 @@ void _exit(int status) {
 
 int main(void) {
   for (;;) {
+    __asm volatile("wfi");  // lets the emulator rest
   }
 }
