@@ -108,7 +108,7 @@ def costs_of(who):
     costs, parts, before = {}, set(), "[^|]*\\|" * 3 * list(BUILDS).index(who)
     for name, symbol in symbols.items():
         core.blocks.clear()
-        formula = None if fits else find(PAGE, rf"^\| `{name}` \|{before} ([^|]*) \|")
+        formula = None if fits else find(PAGE, rf"^\| `{name}` \|{before} ([^|]*) \|(?=[^#]*\n## Who)")
         most, stack = dearest(core, title, symbol, name, formula)
         costs[name] = formula or fit(title, name, most), sum(dict(core.parts()).values()), stack
         parts |= core.parts()
