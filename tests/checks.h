@@ -7,26 +7,11 @@
 #include "model.h"
 #include "support.h"
 
-TWIN(Len)
-TWIN(Upper)
-TWIN(Lower)
-TWIN(Copy)
-TWIN(CopyBuf)
-TWIN(NCopy)
-TWIN(Cat)
-TWIN(CatBuf)
-TWIN(Chr)
-TWIN(Str)
-TWIN(IStr)
-TWIN(NCmp)
-TWIN(NICmp)
-TWIN(Cmp)
-TWIN(ICmp)
-TWIN(Token)
-TWIN(Split)
-TWIN(Trim)
-TWIN(Replace)
-TWIN(ToInt)
+#define TWINS(a, b, c, d, e) TWIN(a) TWIN(b) TWIN(c) TWIN(d) TWIN(e)
+TWINS(Len, Upper, Lower, Copy, CopyBuf)
+TWINS(NCopy, Cat, CatBuf, Chr, Str)
+TWINS(IStr, NCmp, NICmp, Cmp, ICmp)
+TWINS(Token, Split, Trim, Replace, ToInt)
 NAMED_TWIN(FromInt, IntToStr, IntToWStr)
 
 // The name of a function and its arguments, for what is told of a failure.

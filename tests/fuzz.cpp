@@ -38,35 +38,22 @@ void checkOne(FuzzedDataProvider& data) {
   const int n = boundFrom(data);
   const int m = boundFrom(data);
   switch (data.ConsumeIntegralInRange(0, 13)) {
-    case 0:
-      return checkLengthAndCase<Unit>(a);
-    case 1:
-      return checkCopies<Unit>(a, n);
+    case 0: return checkLengthAndCase<Unit>(a);
+    case 1: return checkCopies<Unit>(a, n);
     case 2:
       if (isWide<Unit>) checkCountedAppends(b, a, n, m);
       return checkAppends<Unit>(b, a, n);
-    case 3:
-      return checkFindUnit<Unit>(a, b.empty() ? u'\0' : b[0]);
-    case 4:
-      return checkFind<Unit>(a, b);
-    case 5:
-      return checkCompare<Unit>(a, data.ConsumeBool() ? textFrom<Unit>(data) : a + b, n);
-    case 6:
-      return checkWalk<Unit>(a, b, std::clamp(n, 0, static_cast<int>(a.size())));
-    case 7:
-      return checkSplit<Unit>(a, b);
-    case 8:
-      return checkTrim<Unit>(a, b);
-    case 9:
-      return checkReplace<Unit>(a, b.empty() ? u"-" : b, textFrom<Unit>(data, 4));
-    case 10:
-      return checkFromInt<Unit>(n, m);
-    case 11:
-      return checkToInt<Unit>(data.ConsumeBool() ? model::intToText(n, 10) + b : a);
-    case 12:
-      return checkWords(a, std::min(n, static_cast<int>(a.size())));
-    default:
-      return sizeof(Unit) == 1 ? checkWiden(a, n) : checkEscape(a, n);
+    case 3: return checkFindUnit<Unit>(a, b.empty() ? u'\0' : b[0]);
+    case 4: return checkFind<Unit>(a, b);
+    case 5: return checkCompare<Unit>(a, data.ConsumeBool() ? textFrom<Unit>(data) : a + b, n);
+    case 6: return checkWalk<Unit>(a, b, std::clamp(n, 0, static_cast<int>(a.size())));
+    case 7: return checkSplit<Unit>(a, b);
+    case 8: return checkTrim<Unit>(a, b);
+    case 9: return checkReplace<Unit>(a, b.empty() ? u"-" : b, textFrom<Unit>(data, 4));
+    case 10: return checkFromInt<Unit>(n, m);
+    case 11: return checkToInt<Unit>(data.ConsumeBool() ? model::intToText(n, 10) + b : a);
+    case 12: return checkWords(a, std::min(n, static_cast<int>(a.size())));
+    default: return sizeof(Unit) == 1 ? checkWiden(a, n) : checkEscape(a, n);
   }
 }
 
