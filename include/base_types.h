@@ -13,7 +13,7 @@ typedef uint16_t WCHAR;
 /** An element of a raw array of 16-bit values, which carries no terminator. */
 typedef uint16_t WORD;
 
-/** A signed 8-bit integer. */
+/** A signed 8-bit integer. No function here has one: kits that share these types use it. */
 typedef int8_t INT8;
 
 #endif

@@ -8,6 +8,8 @@
  * pointer is an ordinary argument with a stated result. Errors have no result of their own: they
  * give the null, 0 or empty text that an ordinary argument can give as well.
  *
+ * These headers are for C from C99 on and for C++ from C++11 on; the module alone needs C++17.
+ *
  * The words used below:
  * - unit: one element of a text, a `char` (narrow) or a `WCHAR` (wide). Units are unsigned, 0 to
  *   255 or 0 to 65535, whether the caller's plain `char` is signed or not, and stand alone: no
@@ -22,18 +24,19 @@
  *
  * Counts and capacities are signed, so a miscalculated negative one is as harmless as 0. What a
  * function cannot see is the caller's to get right: that a buffer is large enough, that an output
- * does not overlap an input except where a contract allows it, and that a `WCHAR*` or `WORD*` is
- * even, as every array of these types is: a Cortex-M0+ faults at an odd one.
+ * does not overlap an input except where a contract allows it, and that a ``WCHAR*`` or ``WORD*``
+ * is even, as every array of these types is: a Cortex-M0+ faults at an odd one.
  *
  * A wide twin is declared after its narrow function and has the same contract, with 16-bit units
- * for 8-bit ones. Functions without such a twin state a contract of their own: WStrNCat(),
- * WStrNCatBuf(), WStrNICmp(), and those that convert between the widths.
+ *  for 8-bit ones. CharToLower() and CharToUpper() serve both widths. The other functions without
+ * such a twin state a contract of their own: WStrNCat(), WStrNCatBuf(), WStrNICmp(), and those that
+ * convert between the widths.
  *
  * A wide text is written u"..." in C11, where its type is that of WCHAR. In C++ it is of another
- * type: write `const WCHAR text[] = {'H', 'i', 0}`, or widen a narrow text with StrToWStr().
+ * type: write ``const WCHAR text[] = {'H', 'i', 0}``, or widen a narrow text with StrToWStr().
  *
- * Threads and interrupt handlers may call any function at any time, also the one that was
- * interrupted, as long as none writes a buffer that another uses.
+ * Threads and interrupt handlers may call any function at any time, even while a call of the same
+ * function is interrupted, as long as none writes a buffer that another uses.
  *
  * Beware: SubName.h turns each API name into a macro for its numbered link symbol. It rewrites
  * that identifier everywhere after the include, class members too.
@@ -41,11 +44,15 @@
 #ifndef STRUTIL_H
 #define STRUTIL_H
 
-#include "SubName.h"
 #include "base_types.h"
+/* Last, since its macros rewrite what follows. */
+#include "SubName.h"
 
-/** The version of these files. */
-#define STRUTIL_VERSION "1.2.0"
+/** The version of these files, as a text and as numbers for `#if`. */
+#define STRUTIL_VERSION "1.3.0"
+#define STRUTIL_VERSION_MAJOR 1
+#define STRUTIL_VERSION_MINOR 3
+#define STRUTIL_VERSION_PATCH 0
 
 #ifdef __cplusplus
 #define STRUTIL_NOEXCEPT noexcept
@@ -62,11 +69,9 @@ int StrLen(const char* str) STRUTIL_NOEXCEPT;
 /** Wide twin of StrLen(): counts units, not bytes. */
 int WStrLen(const WCHAR* str) STRUTIL_NOEXCEPT;
 
-/** Returns `c` + 32 if `c` is "A" to "Z", else `c`: any int is allowed, units of both widths too.
- */
+/** Returns `c` + 32 if it is "A" to "Z", else `c`. Takes any int, so it serves both widths. */
 int CharToLower(const int c) STRUTIL_NOEXCEPT;
-/** Returns `c` - 32 if `c` is "a" to "z", else `c`: any int is allowed, units of both widths too.
- */
+/** Returns `c` - 32 if it is "a" to "z", else `c`. Takes any int, so it serves both widths. */
 int CharToUpper(const int c) STRUTIL_NOEXCEPT;
 
 /**
@@ -90,9 +95,12 @@ WCHAR* WStrLower(WCHAR* str) STRUTIL_NOEXCEPT;
 /**
  * @name Copying
  * All copies run forward, so `dst` may overlap `src` if it begins before it; a `dst` that begins
- * inside `src` is not supported. The rules are tried in this order: if `dst` is null or the same
- * pointer as `src`, nothing is written; nor by StrCopyBuf() if `n` is below 1; a null `src`
- * empties `dst`; so does StrNCopy() if `n` is below 1.
+ * inside `src` is not supported. The first of these rules that applies decides:
+ * 1. `dst` is null or the same pointer as `src`: nothing is written.
+ * 2. StrCopyBuf() with `n` below 1: nothing is written, not even for a null `src`.
+ * 3. `src` is null: `dst` is emptied.
+ * 4. StrNCopy() with `n` below 1: `dst` is emptied.
+ * 5. Else `src` is copied as each function says.
  */
 /**@{*/
 
@@ -103,17 +111,17 @@ void WStrCopy(WCHAR* dst, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Copies as much of `src` as fits into the capacity `n` of `dst`: at most `n` - 1 units, then the
- * terminator; the units after it are left as they were. With `n` below 1 nothing is written, not
- * even for a null `src`. A cut is not reported: compare the lengths where it matters.
+ * terminator; the units after it are left as they were. A cut is not reported: compare the lengths
+ * where it matters.
  */
 void StrCopyBuf(char* dst, int n, const char* src) STRUTIL_NOEXCEPT;
 /** Wide twin of StrCopyBuf(). */
 void WStrCopyBuf(WCHAR* dst, int n, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
- * Copies at most `n` units of `src`, its terminator counted. It ends after the terminator, without
- * filling up to `n`, or after `n` units: if the length of `src` is `n` or more, `dst` is left
- * unterminated. Nothing of `src` past these units is read. With `n` below 1, `dst` is emptied.
+ * Copies at most `n` units of `src`, its terminator counted. It ends after the terminator, and does
+ * not pad up to `n`, or after `n` units: if the length of `src` is `n` or more, `dst` is left
+ * unterminated. Nothing of `src` past these units is read.
  */
 void StrNCopy(char* dst, const char* src, int n) STRUTIL_NOEXCEPT;
 /** Wide twin of StrNCopy(). */
@@ -124,8 +132,9 @@ void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) STRUTIL_NOEXCEPT;
 /**
  * @name Concatenation
  * All of these append to the text in `dst`, leave it terminated, and leave the units after the new
- * terminator as they were. If `dst` or `src` is null, nothing is written. `src` must not overlap
- * `dst`: a text cannot be appended to itself.
+ * terminator as they were. The terminator is written again even if nothing is appended, so `dst`
+ * must be writable; only if `dst` or `src` is null, or StrCatBuf() or WStrNCatBuf() has no room,
+ * nothing is written. `src` must not overlap `dst`: a text cannot be appended to itself.
  */
 /**@{*/
 
@@ -136,7 +145,7 @@ void WStrCat(WCHAR* dst, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
  * Appends as much of `src` as fits into the capacity `n` of the whole buffer `dst`, old text
- * included. If that leaves no room for a unit more, nothing is written: an old text that is too
+ * included. If that leaves no room for one more unit, nothing is written: an old text that is too
  * long already is not cut. A cut is not reported. `n` does not bound the search for the end of the
  * old text: `dst` holds a terminator, within `n` or not.
  */
@@ -145,14 +154,14 @@ void StrCatBuf(char* dst, int n, const char* src) STRUTIL_NOEXCEPT;
 void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) STRUTIL_NOEXCEPT;
 
 /**
- * Appends at most `num` units of `src` and reads no more than these; with `num` below 1 the text
- * stays as it is. `dst` has room for its text, the units appended and the terminator. Wide only.
+ * Appends at most `num` units of `src` and reads no more than these; with `num` below 1 nothing is
+ * appended. `dst` has room for its text, the units appended and the terminator. Wide only.
  */
 void WStrNCat(WCHAR* dst, const WCHAR* src, int num) STRUTIL_NOEXCEPT;
 
 /**
  * Appends at most `num` units of `src`, and no more than WStrCatBuf() with `n` would; with `num`
- * below 1 the text stays as it is. Wide only.
+ * below 1 nothing is appended. Wide only.
  */
 void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) STRUTIL_NOEXCEPT;
 
@@ -160,8 +169,9 @@ void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) STRUTIL_NOEXCEPT;
 
 /**
  * @name Searching
- * Each returns a pointer into `str` to the first place found, or null: when there is none, when
- * an argument is null, and whenever `str` is empty. Nothing is written.
+ * Each returns a pointer into `str` to the first place found, or null: when there is none, when a
+ * pointer is null, and whenever `str` is empty. Nothing is written. The result is not const
+ * although `str` is: do not write through it if the text is constant.
  */
 /**@{*/
 
@@ -170,7 +180,7 @@ char* StrChr(const char* str, const char c) STRUTIL_NOEXCEPT;
 /** Wide twin of StrChr(). */
 WCHAR* WStrChr(const WCHAR* str, const WCHAR c) STRUTIL_NOEXCEPT;
 
-/** Finds `substr` in `str`. An empty `substr` is found at once, unless `str` is empty too. */
+/** Finds `substr` in `str`; an empty one at the start of `str`, unless that is empty as well. */
 char* StrStr(const char* str, const char* substr) STRUTIL_NOEXCEPT;
 /** Wide twin of StrStr(). */
 WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) STRUTIL_NOEXCEPT;
@@ -207,7 +217,10 @@ int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) STRUTIL_NOEXCEPT;
  * is null.
  */
 int StrNICmp(const char* str1, const char* str2, int n) STRUTIL_NOEXCEPT;
-/** Compares at most `n` units without regard to case. Not irregular as StrNICmp() is: i + 1 too. */
+/**
+ * Compares at most `n` units without regard to case. Unlike StrNICmp(), gives i + 1 where the first
+ * text's unit is the larger.
+ */
 int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) STRUTIL_NOEXCEPT;
 
 /** Compares two texts. */
@@ -236,8 +249,8 @@ int WStrICmp(const WCHAR* str1, const WCHAR* str2) STRUTIL_NOEXCEPT;
  * delimiters remain. Set `*off` to 0 before the first call. Each call leaves it after the
  * delimiter that it overwrote, or at the index of the terminator, from where every call returns
  * null. Delimiters before a token are skipped, so no token stands for an empty field between two
- * of them. `*off` must lie within the uncut text: an index outside is not detected. If an argument
- * is null, the result is null and `*off` stays.
+ * of them. `*off` must be from 0 to the index of the terminator that ended the text before it was
+ * cut: another index is not detected. If an argument is null, the result is null and `*off` stays.
  *
  * A walk's state is `*off` alone, so walks over different texts may alternate, and each call may
  * pass another `dlmt`.
@@ -262,9 +275,11 @@ int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) STRUTIL_NOEXCEPT;
 
 /**
  * Removes the units of the set `trimSet` from both ends of `str` in place and returns the new
- * length. The kept text is moved to the start of `str` and terminated; the units after its
- * terminator are left as they are. The terminator is written again even if nothing is removed, so
- * `str` must be writable. A null or empty `trimSet` removes nothing; a null `str` gives 0.
+ * length. First a terminator is written after the last unit that is kept, even if one is there, so
+ * `str` must be writable; then, if units were removed at the start, the kept text and its
+ * terminator are copied to the start of `str`. No other unit is written: "--ab-." trimmed by "-."
+ * holds 'a', 'b', 0, 'b', 0, '.', 0. A null or empty `trimSet` removes nothing; a null `str` gives
+ * 0.
  */
 int StrTrim(char* str, const char* trimSet) STRUTIL_NOEXCEPT;
 /** Wide twin of StrTrim(). */
@@ -283,7 +298,8 @@ int WStrTrim(WCHAR* str, const WCHAR* trimSet) STRUTIL_NOEXCEPT;
  * With a null `result` nothing is written and the length that the new text will have is returned:
  * call once to size the buffer, provide that many units + 1, and call again to fill it. A smaller
  * buffer is not detected, nor a length that an int cannot hold. `result` must not overlap the other
- * texts, except that it may be `orig` itself if `rep` does not occur in it.
+ * texts, except that it may be `orig` itself if `rep` does not occur in it: nothing is written
+ * then.
  *
  * If `orig`, `rep` or `with` is null or `rep` is empty, the result is 0 and nothing is written, not
  * even a terminator.
@@ -300,10 +316,13 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with,
 
 /**
  * Writes the text of `value` in `radix` to `string` and returns `string`; null if it is null. The
- * text is a "-" if the value is negative, then its digits without leading zeros: "0" to "9", then
- * "a" to "z", then the units that follow "z" for digits above 35, of which 8 or 16 bits are kept.
- * 34 units hold every text with its terminator; 13 do in radix 8, 12 in radix 10, 10 in radix 16
- * and 8 in radix 36. Nothing after the terminator is written.
+ * text is a "-" if the value is negative, in any radix, then its digits without leading zeros, then
+ * the terminator; nothing after it is written. 34 units hold every such text; 13 do in radix 8, 12
+ * in radix 10, 10 in radix 16 and 8 in radix 36.
+ *
+ * A digit d of 0 to 9 is "0" to "9"; above 9 it is the unit 87 + d, cut to the width of a unit: "a"
+ * to "z" up to 35. Above radix 169 (wide: 65449) that can be the unit 0, which ends the text early:
+ * 169 in radix 200 has length 0.
  *
  * Every value is written so, the most negative one included. A radix below 1 gives the empty text.
  * Radix 1 writes 0 as "0" and gives the empty text for every other value.
@@ -315,7 +334,7 @@ WCHAR* IntToWStr(int value, WCHAR* string, int radix) STRUTIL_NOEXCEPT;
 /**
  * Returns the decimal integer at the start of `string`: spaces and tabs, an optional "-", digits.
  * Reading ends at the first other unit, which is ignored with all that follows. Text that does not
- * begin so gives 0, a "+" or a space after the "-" included, and so does null. A value too large
+ * begin so gives 0, and so does null: no "+" is read, and no space after the "-". A value too large
  * for an int is not detected: it wraps modulo 2^32.
  */
 int StrToInt(const char* string) STRUTIL_NOEXCEPT;
@@ -337,8 +356,8 @@ void BytesToWords(const char* src, WORD* des, int len) STRUTIL_NOEXCEPT;
 /**
  * Widens as much of `src` as fits into the capacity `bufsize` of `des`, at most `bufsize` - 1
  * units, then the terminator, and returns `des`; null if it is null. A null `src` empties `des`.
- * So does a `bufsize` below 2, 0 and negative ones included: `des` must have room for one unit in
- * any case. A cut is not reported.
+ * So does a `bufsize` below 2, 0 and negative ones included: `des` must have room for one unit,
+ * whatever `bufsize` is. A cut is not reported.
  */
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) STRUTIL_NOEXCEPT;
 
@@ -349,8 +368,8 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) STRUTIL_NOEXCEPT;
  * An "&" is not escaped itself, so the text cannot be read back for certain. It ends before the
  * first unit or escape that does not fit whole with the terminator; a cut is not reported.
  *
- * A null `src` empties `des`. A `bufsize` below 1 is taken as 1: `des` must have room for one unit
- * in any case. A null `des` gives a constant empty text, which must not be written to.
+ * A null `src` empties `des`. A `bufsize` below 1 is taken as 1: `des` must have room for one unit,
+ * whatever `bufsize` is. A null `des` gives a constant empty text, which must not be written to.
  */
 char* WStrToStr(const WCHAR* src, char* des, int bufsize) STRUTIL_NOEXCEPT;
 
