@@ -1,5 +1,6 @@
 """A Cortex-M0+ that counts cycles: Unicorn executes, this adds up the costs of the Technical Reference
-Manual's timing table, with zero wait states. What a block of instructions costs is worked out once."""
+Manual's timing table, with zero wait states and the multiplier of one cycle. What a block of
+instructions costs is worked out once."""
 from bisect import bisect
 
 import unicorn
@@ -39,9 +40,15 @@ def pushed(op):
     return float("inf") if op & 0xFF87 in (0x4485, 0x4685) else 0  # ADD, MOV to SP: not to be told
 
 
+def is_conditional(op):
+    return op & 0xF000 == 0xD000 and op & 0x0E00 != 0x0E00
+
+
 class Core:
-    """A linked image. After call(): `cycles`, `result` and `stack` in bytes; and `reads_past`, whether
-    a call since forget_given() read what the caller did not give, if that is watched."""
+    """A linked image. After call(): `cycles`, `result` and `stack` in bytes; `reads_past`, whether a call
+    since forget_given() read what the caller did not give, if that is watched; and `directions`, which
+    ways the conditional branches went in all calls: pairs of the address behind one, and whether it was
+    taken."""
 
     def __init__(self, image, watches_reads=False):
         self.uc = unicorn.Uc(unicorn.UC_ARCH_ARM, unicorn.UC_MODE_THUMB | unicorn.UC_MODE_MCLASS)
@@ -49,33 +56,57 @@ class Core:
         self.uc.mem_map(0, 0x100000)
         self.uc.mem_map(RAM, RAM_SIZE)
         self.functions, self.sizes, self.blocks = {}, [], {}
+        self.directions = set()
         with open(image, "rb") as file:
             elf = ELFFile(file)
             for segment in elf.iter_segments("PT_LOAD"):
                 self.uc.mem_write(segment["p_paddr"], segment.data())
-            for symbol in elf.get_section_by_name(".symtab").iter_symbols():
-                if symbol["st_info"]["type"] == "STT_FUNC" and symbol["st_shndx"] != "SHN_UNDEF":
-                    self.functions[symbol.name] = symbol["st_value"] | 1
-                    self.sizes.append((symbol["st_value"] & ~1, symbol["st_size"]))
+            symbols = list(elf.get_section_by_name(".symtab").iter_symbols())
+        for symbol in symbols:
+            if symbol["st_info"]["type"] == "STT_FUNC" and symbol["st_shndx"] != "SHN_UNDEF":
+                self.functions[symbol.name] = symbol["st_value"] | 1
+                self.sizes.append((symbol["st_value"] & ~1, symbol["st_size"]))
         self.sizes.sort()
+        # "$t" is where code begins, "$d" where data does.
+        self.marks = sorted({(symbol["st_value"], symbol.name[:2]) for symbol in symbols
+                             if symbol.name[:2] in ("$t", "$d")})
         self.forget_given()
         self.uc.hook_add(unicorn.UC_HOOK_BLOCK, self.on_block)
         if watches_reads:
             self.uc.hook_add(unicorn.UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
             self.uc.hook_add(unicorn.UC_HOOK_MEM_WRITE, self.on_write, None, DATA, DATA + DATA_SIZE - 1)
 
-    def analyse(self, address, size):
+    def instructions(self, address, size):
+        """Address, operation and width of each instruction of a piece of code."""
         code = bytes(self.uc.mem_read(address, size))
-        cycles = depth = deepest = at = op = width = 0
+        at = 0
         while at < size:
             op = int.from_bytes(code[at:at + 2], "little")
             width = 4 if op >= 0xE800 else 2
+            yield address + at, op, width
+            at += width
+
+    def branches(self, name):
+        """The addresses behind the conditional branches of a function, in their order."""
+        start = self.functions[name] & ~1
+        end = start + dict(self.sizes)[start]
+        found = []
+        for (begin, kind), (after, _) in zip(self.marks, [*self.marks[1:], (1 << 32, "")]):
+            begin, after = max(begin, start), min(after, end)
+            if kind == "$t" and begin < after:
+                found += [address + 2 for address, op, _ in self.instructions(begin, after - begin)
+                          if is_conditional(op)]
+        return found
+
+    def analyse(self, address, size):
+        """Cycles, pushed bytes and the most of these of a block, and the address behind it if it ends in a
+        conditional branch."""
+        cycles = depth = deepest = op = width = 0
+        for _, op, width in self.instructions(address, size):
             cycles += cost(op, width)
             depth += pushed(op)
             deepest = max(deepest, depth)
-            at += width
-        is_conditional = width == 2 and op & 0xF000 == 0xD000 and op & 0x0E00 != 0x0E00
-        return cycles, depth, deepest, address + size if is_conditional else 0
+        return cycles, depth, deepest, address + size if width == 2 and is_conditional(op) else 0
 
     def on_block(self, _uc, address, size, _):
         block = self.blocks.get((address, size))
@@ -83,8 +114,10 @@ class Core:
             block = self.blocks[address, size] = self.analyse(address, size)
         cycles, depth, deepest, after = block
         self.cycles += cycles
-        if self.after and self.after != address:
-            self.cycles += 1  # a taken branch
+        if self.after:
+            taken = self.after != address
+            self.cycles += taken  # a cycle more
+            self.directions.add((self.after, taken))
         self.after = after
         if deepest:
             self.stack = max(self.stack, self.depth + deepest)

@@ -3,6 +3,12 @@ from typing import Callable, NamedTuple
 
 from search import INT, OUT
 
+TEXT_SIZES = 4, 16, 64, 256
+DIGIT_SIZES = 1, 4, 10
+ONE_SIZE = (16,)
+# Those of which the page shows the ratios.
+SHOWN_SIZES = {TEXT_SIZES: (16, 256), DIGIT_SIZES: (4, 10), ONE_SIZE: (16, 256)}
+
 PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the blinds "
          "by 9. ") * 3
 DIGITS = "1234567890"
@@ -19,7 +25,7 @@ class Row(NamedTuple):
     make: Callable
     peer: str = ""
     order: tuple = ()
-    sizes: tuple = (4, 16, 64, 256)
+    sizes: tuple = TEXT_SIZES
 
 
 ROWS = [
@@ -45,11 +51,10 @@ ROWS = [
     Row("StrNCmp", "ended by its count", lambda n, t: ((t, t, n), 0, None), "strncmp"),
     Row("StrNICmp", "other case", lambda n, t: ((t, t.swapcase(), n + 4), 0, None), "strncasecmp"),
     Row("StrCmp", "equal", lambda n, t: ((t, t), 0, None), "strcmp"),
-    Row("StrCmp", "first unit differs", lambda n, t: ((t, "~" + t), -1, None), "strcmp", (), (16,)),
+    Row("StrCmp", "first unit differs", lambda n, t: ((t, "~" + t), -1, None), "strcmp", (), ONE_SIZE),
     Row("StrCmp", "last unit differs", lambda n, t: ((t, t[:-1] + "~"), -n, None), "strcmp"),
     Row("StrICmp", "same text", lambda n, t: ((t, t), 0, None), "strcasecmp"),
     Row("StrICmp", "other case", lambda n, t: ((t, t.swapcase()), 0, None), "strcasecmp"),
-    # Called until it gives null; a C library takes the text at the first call only.
     Row("StrToken", "to the end", lambda n, t: ((t, INT, " "), "walk", (0, t.replace(" ", END))), "strtok_r",
         (0, 2, 1)),
     Row("StrSplit", "", lambda n, t: ((t, " ", INT), len(t.split()), (0, t.replace(" ", END))), "peer_split"),
@@ -58,8 +63,8 @@ ROWS = [
     Row("StrReplace", "one unit by two", lambda n, t: (
         (t, " ", "__", OUT), n + t.count(" "), (3, t.replace(" ", "__") + END)), "peer_replace"),
     Row("IntToStr", "radix 10", lambda n, t: (
-        (int(DIGITS[:n]), OUT, 10), (1, 0), (1, DIGITS[:n] + END)), "itoa", (), (1, 4, 10)),
-    Row("StrToInt", "", lambda n, t: ((DIGITS[:n],), int(DIGITS[:n]), None), "atoi", (), (1, 4, 10)),
+        (int(DIGITS[:n]), OUT, 10), (1, 0), (1, DIGITS[:n] + END)), "itoa", (), DIGIT_SIZES),
+    Row("StrToInt", "", lambda n, t: ((DIGITS[:n],), int(DIGITS[:n]), None), "atoi", (), DIGIT_SIZES),
     Row("BytesToWords", "", lambda n, t: ((t, OUT, n), None, (1, t))),
     Row("StrToWStr", "", lambda n, t: ((t, OUT, n + 1), (1, 0), (1, t + END))),
     Row("WStrToStr", "printable", lambda n, t: (("x" * n, OUT, n + 1), (1, 0), (1, "x" * n + END))),

@@ -1,0 +1,17 @@
+#!/usr/bin/python3
+"""api.py SOURCE: prints the names of the library's functions, as SubName.h has them."""
+import re
+import sys
+from pathlib import Path
+
+
+def functions(source):
+    """The link symbols of the functions, by name."""
+    found = re.findall(r"^#define (\w+) (VELKO_\d+)$", Path(source, "include/SubName.h").read_text(), re.M)
+    if not found:
+        sys.exit("include/SubName.h: no function is found")
+    return dict(found)
+
+
+if __name__ == "__main__":
+    print("\n".join(functions(sys.argv[1])))
