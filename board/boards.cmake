@@ -19,21 +19,20 @@ function(microbit_firmware target)
     COMMAND ${CMAKE_OBJCOPY} -O ihex $<TARGET_FILE:${target}> $<TARGET_FILE:${target}>.hex)
 endfunction()
 
-# board_test(TARGET [MACHINE]): a program for an emulated board alone, whose standard input and output
-# and exit status are those of QEMU, by semihosting. A suite gets a memory that no micro:bit has.
+# board_test(TARGET [MACHINE FLASH RAM]): a program for an emulated board alone, whose standard input
+# and output and exit status are those of QEMU, by semihosting. Without a machine it is a micro:bit
+# with a memory that none has, since a suite is large.
 function(board_test target)
-  set(flash 0)
-  set(ram 0x20000000)
-  set(options "-M;${ARGV1}")
   if(ARGC EQUAL 1)
-    set(options "-M;microbit;-global;nrf51-soc.flash-size=1048576;-global;nrf51-soc.sram-size=262144")
-  elseif(ARGV1 STREQUAL "mps2-an505")
-    set(flash 0x10000000)
-    set(ram 0x38000000)
+    set(ARGN "microbit;0;0x20000000")
+    set(memory "-global;nrf51-soc.flash-size=1048576;-global;nrf51-soc.sram-size=262144;")
   endif()
+  list(GET ARGN 0 machine)
+  list(GET ARGN 1 flash)
+  list(GET ARGN 2 ram)
   link_for_board(${target} ${flash} 1048576 ${ram} 262144 16384)
   target_compile_options(${target} PRIVATE --specs=picolibcpp.specs)
   target_link_options(${target} PRIVATE --specs=picolibcpp.specs --oslib=semihost)
   set_target_properties(${target} PROPERTIES CROSSCOMPILING_EMULATOR
-    "${PROJECT_SOURCE_DIR}/board/on-board;${options};-kernel")
+    "${PROJECT_SOURCE_DIR}/board/on-board;-M;${machine};${memory}-kernel")
 endfunction()
