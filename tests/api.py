@@ -1,4 +1,4 @@
-#!/usr/bin/python3
+#!/usr/bin/python3 -B
 """api.py SOURCE: prints the names of the library's functions, as SubName.h has them."""
 import re
 import sys

@@ -74,8 +74,8 @@ void check(const Function<To, From>& function, Args args, const Outcome* given =
   Call<To, From> call = {texts[0] == null ? nullptr : to.get(), {}, args.numbers, {}};
   for (size_t i = 1; i < texts.size(); ++i) {
     const size_t units = count(texts[i], expected.readsOthers);
-    from[i].emplace(texts[i], units, units);
-    call.from[i] = texts[i] == null ? nullptr : from[i]->get();
+    Memory<From>& memory = from[i].emplace(texts[i], units, units);
+    call.from[i] = texts[i] == null ? nullptr : memory.get();
   }
   // Equal texts are now and then one.
   if constexpr (std::is_same_v<To, From>) {

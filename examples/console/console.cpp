@@ -90,7 +90,7 @@ void append(char* text) {
     StrCatBuf(setting->value, valueSize, text);
     printf("%s = %s", setting->name, setting->value);
     const int cut = wanted - StrLen(setting->value);
-    if (cut > 0) printf(", %d cut: a value has at most %d units", cut, valueSize - 1);
+    if (cut > 0) printf(" (%d units cut: a value has at most %d)", cut, valueSize - 1);
     printf("\n");
   } else {
     printf("\"%s\" is not set\n", name);
@@ -210,9 +210,14 @@ int readLine(char* line) {
     } else if (c == backspace || c == erase) {
       if (length == 0) continue;
       if (--length >= lineSize - 1) continue;
-      // The bytes of one character that follow its first are 128 to 191.
-      while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
-      printf("\b \b");
+      if ((line[length] & 0x80) == 0) {
+        printf("\b \b");
+      } else {
+        // The bytes of one character that follow its first are 128 to 191. It may be wide, so the
+        // line is shown again.
+        while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
+        printf("\r> %.*s\033[K", length, line);
+      }
     } else if (c >= ' ' || c == '\t') {
       if (length < lineSize - 1) {
         line[length] = static_cast<char>(c == '\t' ? ' ' : c);
