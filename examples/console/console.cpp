@@ -216,7 +216,7 @@ int readLine(char* line) {
         // The bytes of one character that follow its first are 128 to 191. It may be wide, so the
         // line is shown again.
         while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
-        printf("\r> %.*s\033[K", length, line);
+        printf("\033[G> %.*s\033[K", length, line);
       }
     } else if (c >= ' ' || c == '\t') {
       if (length < lineSize - 1) {
