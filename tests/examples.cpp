@@ -15,25 +15,18 @@ TEST_CASE_TEMPLATE("StrLen, StrUpper, StrLower: examples", Unit, char, WCHAR) {
 }
 
 TEST_CASE("CharToLower and CharToUpper map the 26 letters and nothing else") {
-  for (int c = -70000; c <= 70000; ++c) {
-    const int lower = c >= 'A' && c <= 'Z' ? c + 32 : c;
-    const int upper = c >= 'a' && c <= 'z' ? c - 32 : c;
-    if (CharToLower(c) != lower || CharToUpper(c) != upper) FAIL_CHECK("wrong for ", c);
-  }
-  for (const int c : {INT_MIN, INT_MIN + 'a', 0x20041, 0x20061, INT_MAX}) {
-    CHECK(CharToLower(c) == c);
-    CHECK(CharToUpper(c) == c);
+  for (int c = -300; c < (isBoard ? 300 : 70000); ++c) {
+    check(ofCharToLower, {{u""}, {c}});
+    check(ofCharToUpper, {{u""}, {c}});
   }
 }
 
 TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf, StrNCopy: examples", Unit, char, WCHAR) {
   checkExamples<Unit>({{strCopy<Unit>, {{u"", u"abc"}, {}}, {{}, u"abc\0"s}},
                        {strCopyBuf<Unit>, {{u"", u"abcdef"}, {4}}, {{}, u"abc\0"s}},
-                       {strCopyBuf<Unit>, {{u"", u"abc"}, {1}}, {{}, u"\0"s}},
                        {strCopyBuf<Unit>, {{u"", u"abc"}, {0}}, {}},
                        {strCopyBuf<Unit>, {{u"", null}, {0}}, {}},
                        {strNCopy<Unit>, {{u"", u"abcde"}, {3}}, {{}, u"abc"}},
-                       {strNCopy<Unit>, {{u"", u"abc"}, {3}}, {{}, u"abc"}},
                        {strNCopy<Unit>, {{u"", u"ab"}, {5}}, {{}, u"ab\0"s}},
                        {strNCopy<Unit>, {{u"", u"ab"}, {0}}, {{}, u"\0"s}}});
 }
@@ -58,10 +51,8 @@ TEST_CASE_TEMPLATE("StrCat, StrCatBuf, WStrNCat, WStrNCatBuf: examples", Unit, c
   checkExamples<Unit>({{strCat<Unit>, {{u"ab", u"cd"}, {}}, {{}, u"abcd\0"s}},
                        {strCatBuf<Unit>, {{u"ab", u"cdef"}, {4}}, {{}, u"abc\0"s}},
                        {strCatBuf<Unit>, {{u"abc", u"def"}, {4}}, {}},
-                       {strCatBuf<Unit>, {{u"abcdef", u"g"}, {4}}, {}},
                        {strCatBuf<Unit>, {{u"", u"g"}, {1}}, {}}});
   checkExamples<WCHAR>({{ofWStrNCat, {{u"ab", u"cdef"}, {2}}, {{}, u"abcd\0"s}},
-                        {ofWStrNCat, {{u"ab", u"cdef"}, {-1}}, {{}, u"ab\0"s}},
                         {ofWStrNCatBuf, {{u"ab", u"cdef"}, {10, 3}}, {{}, u"abcde\0"s}},
                         {ofWStrNCatBuf, {{u"ab", u"cdef"}, {5, 3}}, {{}, u"abcd\0"s}},
                         {ofWStrNCatBuf, {{u"", u"cdef"}, {1, 3}}, {}}});
@@ -69,22 +60,16 @@ TEST_CASE_TEMPLATE("StrCat, StrCatBuf, WStrNCat, WStrNCatBuf: examples", Unit, c
 
 TEST_CASE_TEMPLATE("StrChr, StrStr, StrIStr: examples", Unit, char, WCHAR) {
   checkExamples<Unit>({{strChr<Unit>, {{u"abca", u"a"}, {}}, 0},
-                       {strChr<Unit>, {{u"abc", u"c"}, {}}, 2},
                        {strChr<Unit>, {{u"abc", u""}, {}}, -1},
                        {strStr<Unit>, {{u"aaab", u"aab"}, {}}, 1},
-                       {strStr<Unit>, {{u"ab", u"abc"}, {}}, -1},
-                       {strStr<Unit>, {{u"abc", u""}, {}}, 0},
                        {strStr<Unit>, {{u"", u""}, {}}, -1},
-                       {strIStr<Unit>, {{u"xxHeLLo", u"hEllO"}, {}}, 2},
-                       {strIStr<Unit>, {{u"@[", u"`{"}, {}}, -1}});
+                       {strIStr<Unit>, {{u"xxHeLLo", u"hEllO"}, {}}, 2}});
 }
 
 TEST_CASE_TEMPLATE("All comparisons: examples", Unit, char, WCHAR) {
   checkExamples<Unit>({{strCmp<Unit>, {{u"abc", u"abd"}, {}}, -3},
-                       {strCmp<Unit>, {{u"abc", u"ab"}, {}}, 3},
                        {strCmp<Unit>, {{u"\u00e9", u"a"}, {}}, 1},
                        {strICmp<Unit>, {{u"abC", u"ABd"}, {}}, -3},
-                       {strICmp<Unit>, {{u"_", u"A"}, {}}, -1},
                        {strNCmp<Unit>, {{u"abcX", u"abcY"}, {3}}, {{0}, u"", 3, 3}},
                        {strNCmp<Unit>, {{u"abcX", u"abcY"}, {4}}, {{-4}, u"", 4, 4}},
                        {strNICmp<Unit>, {{u"b", u"A"}, {5}}, isWide<Unit> ? 1 : -1}});
@@ -104,10 +89,8 @@ TEST_CASE_TEMPLATE("StrToken, StrSplit, StrTrim: examples", Unit, char, WCHAR) {
       {{strToken<Unit>, {{u",,ab,,c,", u","}, {0}}, {{2, 5, 6, 8, -1, 8, -1, 8}, u",,ab\0,c\0\0"s}},
        {strToken<Unit>, {{u"a b;c", u" ;"}, {2}}, {{2, 4, 4, 5, -1, 5, -1, 5}, u"a b\0c\0"s}},
        {strSplit<Unit>, {{u",,ab,,c,", u","}, {}}, {{2, 2, 6}, u",,ab\0,c\0\0"s}},
-       {strSplit<Unit>, {{u"ab", u""}, {}}, {{1, 0}, u"ab\0"s}},
        {strSplit<Unit>, {{u",,", u","}, {}}, {{0}, u",,\0"s}},
        {strTrim<Unit>, {{u"--ab-.", u"-."}, {}}, {{2}, u"ab\0b\0.\0"s}},
-       {strTrim<Unit>, {{u"ab-.", u"-."}, {}}, {{2}, u"ab\0.\0"s}},
        {strTrim<Unit>, {{u"--", u"-"}, {}}, {{0}, u"\0-\0"s}},
        {strTrim<Unit>, {{u"a-b", null}, {}}, {{3}, u"a-b\0"s}}});
   Unit text[] = {'a', ',', 'b', 0};
@@ -118,7 +101,6 @@ TEST_CASE_TEMPLATE("StrToken, StrSplit, StrTrim: examples", Unit, char, WCHAR) {
 TEST_CASE_TEMPLATE("StrReplace: examples", Unit, char, WCHAR) {
   checkExamples<Unit>({{strReplace<Unit>, {{u"", u"a-b-c", u"-", u"=="}, {}}, {{7}, u"a==b==c\0"s}},
                        {strReplace<Unit>, {{null, u"abcabc", u"abc", u"x"}, {}}, 2},
-                       {strReplace<Unit>, {{u"", u"aaa", u"aa", u"b"}, {}}, {{2}, u"ba\0"s}},
                        {strReplace<Unit>, {{u"", u"aXbX", u"X", u"XX"}, {}}, {{6}, u"aXXbXX\0"s}},
                        {strReplace<Unit>, {{u"", u"a", u"", u"b"}, {}}, 0},
                        {strReplace<Unit>, {{u"", u"", u"a", u"b"}, {}}, {{0}, u"\0"s}}});
@@ -129,12 +111,8 @@ TEST_CASE_TEMPLATE("IntToStr, StrToInt: examples", Unit, char, WCHAR) {
       {{strFromInt<Unit>, {{u""}, {-123, 10}}, {{0}, u"-123\0"s}},
        {strFromInt<Unit>, {{u""}, {255, 16}}, {{0}, u"ff\0"s}},
        {strFromInt<Unit>, {{u""}, {INT_MIN, 2}}, {{0}, u"-1" + Units(31, u'0') + u'\0'}},
-       {strFromInt<Unit>, {{u""}, {36, 37}}, {{0}, u"{\0"s}},
-       {strFromInt<Unit>, {{u""}, {0, 1}}, {{0}, u"0\0"s}},
        {strFromInt<Unit>, {{u""}, {7, 0}}, {{0}, u"\0"s}},
        {strToInt<Unit>, {{u" \t -42x"}, {}}, -42},
-       {strToInt<Unit>, {{u"+5"}, {}}, 0},
-       {strToInt<Unit>, {{u"- 4"}, {}}, 0},
        {strToInt<Unit>, {{u"2147483648"}, {}}, INT_MIN},
        {strToInt<Unit>, {{u"4294967297"}, {}}, 1}});
 }
@@ -143,7 +121,6 @@ TEST_CASE("BytesToWords, StrToWStr, WStrToStr, WStrToWords: examples") {
   checkExamples<WORD, char>(
       {{ofBytesToWords, {{u"", u"a\0\u00ff"s}, {3}}, {{}, u"a\0\u00ff"s}},
        {ofStrToWStr, {{u"", u"\u00e9\u00ff"}, {5}}, {{0}, u"\u00e9\u00ff\0"s}},
-       {ofStrToWStr, {{u"", u"abc"}, {2}}, {{0}, u"a\0"s}},
        {ofStrToWStr, {{u"", u"abc"}, {0}}, {{0}, u"\0"s}}});
   checkExamples<char, WCHAR>({{ofWStrToStr, {{u"", u"a\nb"}, {20}}, {{0}, u"a&(0xa)b\0"s}},
                               {ofWStrToStr, {{u"", u"\n"}, {6}}, {{0}, u"\0"s}},

@@ -78,16 +78,6 @@ inline void (*tell)(const char* file, int line, const std::string& failure) =
       ADD_FAIL_CHECK_AT(file, line, failure);
     };
 
-// The first three failures of a test case say enough.
-inline bool isWorthTelling() {
-  static const void* testCase = nullptr;
-  static int failures = 0;
-  const void* const now = doctest::getContextOptions()->currentTest;
-  failures = now == testCase ? failures + 1 : 1;
-  testCase = now;
-  return failures <= 3;
-}
-
 // A number below n, of a sequence that is the same in each run.
 inline unsigned nextNumber(unsigned n) {
   static uint32_t state = 1;
