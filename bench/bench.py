@@ -190,12 +190,10 @@ def cost_of(core, title, symbol, name, stated):
     if stated:
         formula = stated
         loose, lengths = min(formulas.looseness(formula, dearest.calls), key=lambda one: one[0])
-        most = formulas.STALE
     else:
         formula = formulas.fit(title, name, dearest.calls)
         loose, lengths = max(formulas.looseness(formula, dearest.calls), key=lambda one: one[0])
-        most = formulas.LOOSEST
-    if loose > most:
+    if loose > formulas.LOOSEST:
         sys.exit(f"{title}: {name}: {formula} is {loose:.2f} times what a call of {lengths} takes: run ./dev "
                  "bench; if that says so, find better terms or calls (see CONTRIBUTING.md)")
     return Cost(formula, sum(dict(core.parts()).values()), dearest.stack)

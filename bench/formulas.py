@@ -21,10 +21,9 @@ TERMS = {
     "n / m": lambda lengths: lengths["n"] / max(lengths["m"], 1),
 }
 
-# How many times the cycles of a call that is judged a formula may be when it is found; and of the dearest
-# call of a later check, which makes some of the calls only.
+# How many times the cycles of a call that is judged a formula may be: of every one when it is found, of the
+# dearest in a later check, which makes some of the calls only.
 LOOSEST = 1.4
-STALE = 1.1
 
 
 class Formula:
@@ -91,12 +90,13 @@ def run(core, symbol, name, arguments, skew=False, order=()):
 
 def search(core, build, symbol, name, limit=None):
     """Makes the calls of a function; fails where one takes more cycles than `limit`, if that is given.
-    A change of the code shows in a fifth of the long ones, and a twenty-fifth of the longest, so only these
-    are made then."""
+    A change of the code shows in a fifth of the long ones, and in fewer of the longest, so only these are
+    made then."""
     most, stack = {}, 0
     for index, (arguments, lengths, skew) in enumerate(calls_of(name)):
         n = lengths.get("n", 0)
-        if limit and ((n > 8 and index % 5 > 0) or (n > 40 and index % 25 > 0)):
+        every = 1 if n <= 8 else 5 if n <= 40 else 25 if n <= 140 else 125
+        if limit and index % every > 0:
             continue
         run(core, symbol, name, arguments, skew)
         if limit and core.cycles > limit.of(lengths):
