@@ -20,7 +20,9 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* bytes, size_t size) {
     return data.ConsumeIntegralInRange<unsigned>(0, static_cast<unsigned>(n) - 1);
   };
   while (data.remaining_bytes() > 0) {
-    const unsigned chosen = choose(29);
+    unsigned count = 0;
+    withEach<WCHAR>([&count](const auto&) { ++count; });
+    const unsigned chosen = choose(count);
     unsigned i = 0;
     const auto checkChosen = [&](const auto& function) {
       if (i++ == chosen) checkByChance(function, choose);

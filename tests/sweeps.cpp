@@ -3,7 +3,7 @@
 
 namespace {
 
-// The first `count` choices of null pointers, counts around 0 and such texts.
+// Each choice of pointers that are null, with counts around 0.
 template <typename To, typename From>
 void checkNulls(const Function<To, From>& function) {
   const std::string& arguments = function.arguments;
@@ -65,7 +65,9 @@ TEST_CASE_TEMPLATE("Every function, with texts and bounds of many lengths", Unit
         if (hasUnits && bound > static_cast<int>(length)) continue;
         for (Args args : {Args{{text, text + u"#", u"#", text}, {bound, bound}},
                           Args{{text + u"#", u"#", u"a", u"bc"}, {bound, bound}}}) {
-          args.texts.resize(std::min(arguments.find('n'), arguments.size()));
+          const size_t texts = std::min(arguments.find('n'), arguments.size());
+          args.texts.resize(texts);
+          args.numbers.resize(arguments.size() - texts);
           if (!function.readsFirst()) args.texts[0] = u"";
           if (!function.readsFirst() && args.texts.size() > 1) args.texts[1] = text;
           check(function, args);
