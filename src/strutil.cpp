@@ -1,6 +1,5 @@
-// Each operation is written once, mostly as a template on the unit, by family; then follow the
-// functions of the library, which call them. An unnamed namespace leaves no symbols of the
-// templates.
+// Each operation is implemented once, mostly as a template on the unit type, in an unnamed
+// namespace (no symbols). The exported functions at the end of the file call these templates.
 #include "strutil.h"
 
 #include <limits.h>
@@ -9,55 +8,81 @@
 #error "ARM code: give the C++ compiler the processor, such as -mcpu=cortex-m0plus, or -mthumb"
 #endif
 
-// The division of a target that has none, in the compiler's runtime: gives the quotient and, above
-// it, the remainder. It is declared here, since Clang puts no_builtin on definitions only.
+// The runtime's division: the quotient is the low word, the remainder the high one. It is declared
+// before the attributes below, since Clang allows no_builtin on definitions only.
 extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOLINT: the ABI's name
 
-// That compilers invent no library call and no constant data, and that these loops are fast and
-// small: users' flags cannot be relied on for it. Figures are of -O2 by GCC 12 and Clang 19 for the
-// Cortex-M0+: bytes of all code, and cycles of all calls that the benchmark compares.
+// Two codes in one source
+//
+// The fast code unrolls its loops, the small code does not. Builds for size (-Os, -Oz) and builds
+// without optimisation have the small code, all others the fast one. With GCC this file also sets
+// its own optimisation level, so that a Debug build has the machine code of a release.
+#if defined(__OPTIMIZE__) && !defined(__OPTIMIZE_SIZE__)
+#define STRUTIL_FAST 1
+#else
+#define STRUTIL_FAST 0
+#endif
+
+// Options for this file, since users' flags cannot be relied on. First what keeps promises: no call
+// of a C library, no constant data, no unwind tables. Without one of these lines tests/check-object
+// fails, or the test that the line names.
 #if defined(__clang__)
 #pragma clang attribute push
-// The first is insurance: Clang 19 and 22 make no call of these loops. Without the others: calls of
-// the C library, where users protect functions; tables for unwinding that need the C++ runtime;
-// every small loop four times (2,740 bytes, 9 %).
-#pragma clang attribute(__attribute__((no_builtin)), apply_to = function)
+#pragma clang attribute(__attribute__((no_builtin)), apply_to = function)  // Clang 22: strlen
 #pragma clang attribute(__attribute__((no_stack_protector)), apply_to = function)
-#pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))
-#pragma clang attribute(__attribute__((minsize)), apply_to = function)
-#define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // flatten: of lambdas; 105 %
+#pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))  // tables
 #elif defined(__GNUC__)
 #pragma GCC push_options
-#pragma GCC optimize("no-stack-protector")  // calls, where users ask for it; as does the next
-#if __GNUC__ >= 12
-#pragma GCC optimize("trivial-auto-var-init=uninitialized")
+#if STRUTIL_FAST
+#pragma GCC optimize("O2", "inline")
+#else
+#pragma GCC optimize("Os", "inline")  // without "inline", -O0 would inline nothing
 #endif
-#pragma GCC optimize("no-exceptions")  // tables for unwinding, as above: 400 bytes
-// Constant data, where there are vectors; the first also costs 400 bytes and 4 % here.
+#pragma GCC optimize("no-stack-protector", "no-exceptions")
+#if __GNUC__ >= 12
+#pragma GCC optimize("trivial-auto-var-init=uninitialized")  // memset
+#endif
+// Loops become calls, or vectors with constant data. The first also saves 2.4 % and 388 bytes.
 #pragma GCC optimize("no-tree-loop-optimize", "no-tree-slp-vectorize")
-// Wrong code by GCC 12's "-Os -fno-inline-small-functions -fno-inline-functions-called-once": a
-// caller keeps values in r1 to r3, and the called function pops its frame into them.
+// Wrong code from GCC 12 at "-Os -fno-inline-small-functions -fno-inline-functions-called-once": a
+// caller keeps values in r1 to r3 across a call that overwrites them. The test is suite_calls.
 #pragma GCC optimize("no-ipa-ra")
-// More values than the core has low registers: up to 1.7 % each, and 13 % of WStrToStr.
+#endif
+
+// Then what saves cycles or bytes. A figure says how much more the fast code takes without the
+// line: cycles as the geometric mean of the benchmark's calls of 4 units and more, bytes of all
+// functions, with GCC 12 or Clang 19 for the Cortex-M0+.
+#if defined(__clang__)
+// Clang would unroll the unrolled loops again: 5.1 %, 2,966 bytes.
+#pragma clang attribute(__attribute__((minsize)), apply_to = function)
+#define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // flatten: of lambdas, 74 %
+#elif defined(__GNUC__)
+// These keep more values at once than there are low registers: 0.3, 0.5 and 0.6 %.
 #pragma GCC optimize("no-tree-pre", "no-move-loop-invariants", "no-schedule-insns")
-#pragma GCC optimize("no-schedule-insns2", "no-if-conversion")
-#pragma GCC optimize("no-partial-inlining")  // a call before a loop: 190 bytes
+#pragma GCC optimize("no-if-conversion")     // 0.2 %, and 2.6 % of the small code
+#pragma GCC optimize("no-partial-inlining")  // 0.6 % and 192 bytes: a call in front of a loop
 #define STRUTIL_INLINE [[gnu::always_inline]] inline
 #else
 #define STRUTIL_INLINE inline
 #endif
 
-#if defined(__clang__) || defined(__GNUC__)
-#define STRUTIL_UNLIKELY(condition) __builtin_expect(condition, 0)
-#define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides where the value comes from
-#define STRUTIL_ALIASING [[gnu::may_alias]]
+#if defined(__GNUC__) && !STRUTIL_FAST                 // it would add 264 bytes to GCC's fast code
+#define STRUTIL_LAMBDA __attribute__((always_inline))  // or GCC 8 keeps the captures in memory
+#else
+#define STRUTIL_LAMBDA
+#endif
+
+#if defined(__GNUC__)                                               // Clang defines it, too
+#define STRUTIL_UNLIKELY(condition) __builtin_expect(condition, 0)  // GCC 2.2 %, Clang 0.8 %
+#define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides from the compiler what it knows
 #else
 #define STRUTIL_UNLIKELY(condition) (condition)
 #define STRUTIL_OPAQUE(value) value = const_cast<const volatile unsigned&>(value)
 #endif
 
-// Parks a value that a loop does not use in a high register: 24 % of a short StrCmp by GCC.
-#if defined(__thumb__) && !defined(__thumb2__) && !defined(__OPTIMIZE_SIZE__)
+// Keeps a value that a loop does not need in a high register (r8 to r12), so that the loop has the
+// low ones: 0.6 % with GCC, 0.8 % with Clang, which needs it before the loop and behind it.
+#if defined(__thumb__) && !defined(__thumb2__) && STRUTIL_FAST
 #define STRUTIL_PARK(value) __asm__("" : "+h"(value))
 #else
 #define STRUTIL_PARK(value) static_cast<void>(value)
@@ -65,7 +90,7 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 
 namespace {
 
-// Narrow text is read and written as bytes, so that nothing depends on the sign of a plain char.
+// Narrow strings are read and written as bytes, so that nothing depends on the sign of plain char.
 using Byte = uint8_t;
 
 STRUTIL_INLINE Byte* units(char* str) { return reinterpret_cast<Byte*>(str); }
@@ -73,36 +98,29 @@ STRUTIL_INLINE const Byte* units(const char* str) { return reinterpret_cast<cons
 STRUTIL_INLINE WCHAR* units(WCHAR* str) { return str; }
 STRUTIL_INLINE const WCHAR* units(const WCHAR* str) { return str; }
 
+// Back to the type of the API, which returns pointers into const strings as non-const.
 char* text(const Byte* str) { return reinterpret_cast<char*>(const_cast<Byte*>(str)); }
 WCHAR* text(const WCHAR* str) { return const_cast<WCHAR*>(str); }
 
-// Bounds of a walk: how many more units it may take.
+// Bounds of a loop: whether it may take so many more units. takeNext() may only follow a call that
+// returned true; of it, GCC makes one subtraction and one branch.
 struct Count {
+  enum { isCount = true };
   int left = INT_MAX;
-  bool take(int count) {
+  STRUTIL_INLINE bool take(int count) {
     if (left < count) return false;
     left -= count;
     return true;
   }
+  STRUTIL_INLINE bool takeNext() { return --left >= 0; }
 };
 
 struct Unbounded {
-  static bool take(int) { return true; }
+  enum { isCount = false };
+  static bool take(int) { return true; }  // STRUTIL_INLINE would cost the small code 5 %
 };
 
-// A small build shares what a fast one repeats: a function that serves several of the library's,
-// rather than a copy in each; a loop with a bound, however great, also for those without.
-#if defined(__OPTIMIZE_SIZE__)
-#define STRUTIL_CORE inline
-enum { isSmall = true };  // enumerators, not constants: unoptimised builds store those
-using Whole = Count;
-#else
-#define STRUTIL_CORE STRUTIL_INLINE
-enum { isSmall = false };
-using Whole = Unbounded;
-#endif
-
-// As an integer: of a pointer that moves, Clang makes several, each with an offset of its own.
+// As an integer, or Clang would split a pointer that moves into several: 8.5 % and 528 bytes.
 template <typename Unit>
 STRUTIL_INLINE void advance(Unit*& at, uintptr_t count) {
   at = reinterpret_cast<Unit*>(reinterpret_cast<uintptr_t>(at) + count * sizeof(Unit));
@@ -114,28 +132,38 @@ STRUTIL_INLINE bool stopAfter(uintptr_t count, Unit*&... at) {
   return false;
 }
 
-// What all loops over text are expressed through: passes the units that the pointers point at to
-// `goesOn`, one of each, and moves all pointers on by one unit, until `goesOn` returns false or the
-// bound is reached, and returns whether that ended it. The pointers are left at the units that
-// ended it, or after the last ones. Four steps a turn: arithmetic, jump and bound cost half a
-// simple step. By value, `goesOn` would be copied by memcpy in GCC's -Og.
+// The loop behind nearly every function. Calls `goesOn` with the unit at each pointer and advances
+// all pointers by one unit, until `goesOn` returns false or the bound is reached; returns whether
+// the bound ended it. The pointers are the caller's own: they are left at the units that `goesOn`
+// rejected, or just past the last ones. The units are references, so that `goesOn` may write them.
+// `goesOn` comes by reference, since GCC's -Og would copy it with memcpy.
 template <typename Bound, typename GoesOn, typename... Unit>
 STRUTIL_INLINE bool walk(Bound bound, const GoesOn& goesOn, Unit*&... at) {
-  for (; !isSmall && bound.take(4); (..., advance(at, 4))) {
-    if (STRUTIL_UNLIKELY(!goesOn(at[0]...))) return false;
-    if (STRUTIL_UNLIKELY(!goesOn(at[1]...))) return stopAfter(1, at...);
-    if (STRUTIL_UNLIKELY(!goesOn(at[2]...))) return stopAfter(2, at...);
-    if (STRUTIL_UNLIKELY(!goesOn(at[3]...))) return stopAfter(3, at...);
+  if constexpr (STRUTIL_FAST) {
+    // Unrolled: addition, branch and bound take half the cycles of a simple step.
+    for (; bound.take(4); (..., advance(at, 4))) {
+      if (STRUTIL_UNLIKELY(!goesOn(at[0]...))) return false;
+      if (STRUTIL_UNLIKELY(!goesOn(at[1]...))) return stopAfter(1, at...);
+      if (STRUTIL_UNLIKELY(!goesOn(at[2]...))) return stopAfter(2, at...);
+      if (STRUTIL_UNLIKELY(!goesOn(at[3]...))) return stopAfter(3, at...);
+    }
+  } else if constexpr (Bound::isCount) {
+    if (!bound.take(1)) return true;
+    do {
+      if (!goesOn(*at...)) return false;
+      (..., ++at);
+    } while (bound.takeNext());
+    return true;
   }
-  for (; bound.take(1); (..., advance(at, 1))) {
+  for (; bound.take(1); (..., ++at)) {
     if (!goesOn(*at...)) return false;
   }
   return true;
 }
 
-// Clang would make a constant before the loop, in a register: 55 % of a short StrCmp.
+// Stops Clang from loading a constant before the loop, where it would occupy a register: 1.0 %.
 template <typename Value>
-STRUTIL_INLINE Value late(Value value) {
+STRUTIL_INLINE Value notHoisted(Value value) {
 #if defined(__clang__)
   STRUTIL_OPAQUE(value);
 #endif
@@ -144,7 +172,7 @@ STRUTIL_INLINE Value late(Value value) {
 
 // Lengths and case mapping
 
-enum { caseBit = 'a' - 'A' };  // what separates the two cases of a letter
+enum { caseBit = 'a' - 'A' };  // in which the two cases of a letter differ
 
 bool isLetterFrom(unsigned first, int c) { return static_cast<unsigned>(c) - first < 26; }
 
@@ -152,16 +180,16 @@ template <typename Unit>
 STRUTIL_INLINE int length(const Unit* str) {
   if (!str) return 0;
   const Unit* end = str;
-  walk(Unbounded{}, [](unsigned unit) { return unit != 0; }, end);
+  walk(Unbounded{}, [](unsigned unit) STRUTIL_LAMBDA { return unit != 0; }, end);
   return static_cast<int>(end - str);
 }
 
 // Adds `change` to the 26 letters from `first` on. Most units need only the first test.
 template <typename Unit>
-STRUTIL_CORE Unit* switchCase(Unit* str, unsigned first, int change) {
+STRUTIL_INLINE Unit* mapCase(Unit* str, unsigned first, int change) {
   if (!str) return nullptr;
   Unit* at = str;
-  const auto mapUnit = [=](Unit& unit) {
+  const auto mapUnit = [=](Unit& unit) STRUTIL_LAMBDA {
     if (unit < first) return unit != 0;
     if (unit < first + 26) unit = static_cast<Unit>(unit + change);
     return true;
@@ -172,12 +200,12 @@ STRUTIL_CORE Unit* switchCase(Unit* str, unsigned first, int change) {
 
 // Copying
 
-// Copies up to and including the terminator, or until the bound, where it may write a terminator of
-// its own. Returns where the terminator is, or would be.
+// Copies up to and including the terminator, or up to the bound, where it may write a terminator of
+// its own. Returns a pointer to the terminator, or just past the last unit.
 enum AtBound { stop, terminate };
 template <typename To, typename From, typename Bound>
-STRUTIL_CORE To* copyUnits(To* dst, const From* src, Bound bound, AtBound atBound) {
-  const auto copyUnit = [](To& to, From from) { return (to = from) != 0; };
+STRUTIL_INLINE To* copyUnits(To* dst, const From* src, Bound bound, AtBound atBound) {
+  const auto copyUnit = [](To& to, From from) STRUTIL_LAMBDA { return (to = from) != 0; };
   if (walk(bound, copyUnit, dst, src) && atBound == terminate) *dst = 0;
   return dst;
 }
@@ -185,11 +213,8 @@ STRUTIL_CORE To* copyUnits(To* dst, const From* src, Bound bound, AtBound atBoun
 template <typename Unit>
 STRUTIL_INLINE void copy(Unit* dst, const Unit* src) {
   if (!dst || dst == src) return;
-  if (src) {
-    copyUnits(dst, src, Unbounded{}, stop);
-  } else {
-    *dst = 0;
-  }
+  if (!src) *dst = 0;
+  if (src) copyUnits(dst, src, Unbounded{}, stop);
 }
 
 template <typename Unit>
@@ -207,25 +232,15 @@ void nCopy(Unit* dst, const Unit* src, int n) {
 
 // Concatenation
 
-// Pairs such as these let a template call the twin of its own width.
-int strLen(const Byte* str) { return StrLen(text(str)); }
-int strLen(const WCHAR* str) { return WStrLen(str); }
-
-// `length` in a fast build, a call of the function that has it in a small one.
-template <typename Unit>
-STRUTIL_INLINE int lengthOf(const Unit* str) {
-  return isSmall ? strLen(str) : length(str);
-}
-
 template <typename Unit, typename Bound>
 void cat(Unit* dst, const Unit* src, Bound bound) {
-  if (dst && src) copyUnits(dst + lengthOf(dst), src, bound, terminate);
+  if (dst && src) copyUnits(dst + length(dst), src, bound, terminate);
 }
 
 template <typename Unit>
-STRUTIL_CORE void nCatBuf(Unit* dst, int n, const Unit* src, int num = INT_MAX) {
+STRUTIL_INLINE void catBuf(Unit* dst, int n, const Unit* src, int num = INT_MAX) {
   if (!dst || !src) return;
-  const int off = lengthOf(dst);
+  const int off = length(dst);
   if (n <= off + 1) return;
   const int nMax = n - off - 1;
   copyUnits(dst + off, src, Count{num < nMax ? num : nMax}, terminate);
@@ -233,73 +248,72 @@ STRUTIL_CORE void nCatBuf(Unit* dst, int n, const Unit* src, int num = INT_MAX) 
 
 // Searching
 
-// The last is StrNICmp's, by its contract: every difference is negative.
+// The last is for StrNICmp, whose contract makes every difference negative.
 enum CaseRule { exact, ignoreCase, ignoreCaseAndOrder };
 
-// Whether two units that differ are the two cases of a letter.
+// Whether two units that differ are the two cases of one letter.
 STRUTIL_INLINE bool differInCaseOnly(int a, int b) {
-  if (STRUTIL_UNLIKELY((a ^ b) != caseBit)) return false;
-  return isLetterFrom('a', a | b);
+  return !STRUTIL_UNLIKELY((a ^ b) != caseBit) && isLetterFrom('a', a | b);
 }
 
 template <typename Unit>
 STRUTIL_INLINE Unit* findUnit(Unit* str, unsigned c) {
   if (!str) return nullptr;
-  Unit* place = nullptr;
-  const auto isOther = [c, &place](Unit& unit) {
-    if (unit == 0) return false;
-    if (unit == c) {
-      place = &unit;
+  Unit* match = nullptr;
+  const auto isNoMatch = [c, &match](Unit& unit) STRUTIL_LAMBDA {
+    if (unit == 0) {
+      match = nullptr;
       return false;
     }
-    return true;
+    match = &unit;
+    return unit != c;
   };
-  walk(Unbounded{}, isOther, str);
-  return place;
+  walk(Unbounded{}, isNoMatch, str);
+  return match;
 }
 
-// Looks for the first unit of substr before it compares the rest. Where the rest fails at the
-// terminator of str, no later place has room for substr.
+// Searches for the first unit of `substr` before it compares the rest. If the rest fails at the
+// terminator of `str`, no later position has room for `substr`.
 template <typename Unit>
-STRUTIL_CORE const Unit* find(const Unit* str, const Unit* substr, CaseRule rule) {
+STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule rule) {
   if (!str || !substr || *str == 0) return nullptr;
   const int first = *substr;
   if (first == 0) return str;
-  const bool hasCases = rule == ignoreCase && differInCaseOnly(first, first ^ caseBit);
+  const bool hasCases = rule == ignoreCase && isLetterFrom('a', first | caseBit);
   const int other = hasCases ? first ^ caseBit : first;
   for (;; ++str) {
-    const Unit* place = nullptr;
-    const auto isOther = [=, &place](const Unit& unit) {
+    const Unit* match = nullptr;
+    const auto isNoMatch = [=, &match](const Unit& unit) STRUTIL_LAMBDA {
       if (unit != first && unit != other) return unit != 0;
-      place = &unit;
+      match = &unit;
       return false;
     };
-    walk(Unbounded{}, isOther, str);
-    if (!place) return late<const Unit*>(nullptr);
-    str = place;
+    walk(Unbounded{}, isNoMatch, str);
+    if (!match) return notHoisted<const Unit*>(nullptr);
+    str = match;
     const Unit* at = str + 1;
     const Unit* rest = substr + 1;
-    int a = 0;
-    int b = 0;
-    const auto match = [=, &a, &b](int unit, int wanted) {
-      a = unit;
-      b = wanted;
-      if (a != b) return rule == ignoreCase && differInCaseOnly(unit, wanted);
-      if (wanted == 0) return false;  // "return wanted != 0" costs GCC 236 bytes
+    int lastOfStr = 0;  // the units that ended the comparison
+    int lastOfSubstr = 0;
+    const auto isSame = [=, &lastOfStr, &lastOfSubstr](int unit, int wanted) STRUTIL_LAMBDA {
+      lastOfStr = unit;
+      lastOfSubstr = wanted;
+      if (unit != wanted) return rule == ignoreCase && differInCaseOnly(unit, wanted);
+      if (wanted == 0) return false;  // "return wanted != 0" takes GCC 1.4 % and 236 bytes more
       return true;
     };
-    walk(Unbounded{}, match, at, rest);
-    if (b == 0) return str;
-    if (a == 0) return late<const Unit*>(nullptr);
+    walk(Unbounded{}, isSame, at, rest);
+    if (lastOfSubstr == 0) return str;
+    if (lastOfStr == 0) return notHoisted<const Unit*>(nullptr);
   }
 }
 
 // Comparison
 
-// Returns 0, or the position i + 1 of the first difference: negative where str1 has the smaller
-// unit. Units that are equal are not mapped, and the others only to see which is the smaller.
+// Returns 0, or the position i + 1 of the first difference, negative if the unit of str1 is the
+// smaller one. Only two units that differ are mapped to lowercase, to find which is the smaller.
 template <typename Unit, typename Bound>
-STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, CaseRule rule) {
+STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bound bound) {
   if (!str1 || !str2) return (str1 ? 1 : 0) - (str2 ? 1 : 0);
   if (str1 == str2) return 0;
   const Unit* at = str1;
@@ -307,7 +321,7 @@ STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, CaseRu
   bool differ = false;
   int a = 0;
   int b = 0;
-  const auto match = [=, &differ, &a, &b](int unit1, int unit2) {
+  const auto match = [=, &differ, &a, &b](int unit1, int unit2) STRUTIL_LAMBDA {
     a = unit1;
     b = unit2;
     if (STRUTIL_UNLIKELY(a != b)) {
@@ -318,7 +332,7 @@ STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, CaseRu
     return unit2 != 0;
   };
   walk(bound, match, at, str2);
-  if (!differ) return late(0);
+  if (!differ) return notHoisted(0);
   STRUTIL_PARK(str1);
   const int position = static_cast<int>(at - str1) + 1;
   if (rule == ignoreCaseAndOrder) return -position;
@@ -331,25 +345,24 @@ STRUTIL_CORE int compare(const Unit* str1, const Unit* str2, Bound bound, CaseRu
 
 // Tokenizing and splitting
 
-Byte* strChr(const Byte* str, unsigned c) { return units(StrChr(text(str), static_cast<char>(c))); }
-WCHAR* strChr(const WCHAR* str, unsigned c) { return WStrChr(str, static_cast<WCHAR>(c)); }
-
-// Sets are short: a turn of the walk costs more than it saves.
+// The terminator is in no set, so that a loop that skips the units of a set ends with the string.
+// Sets are short: an unrolled loop would take longer to start than it saves.
 template <typename Unit>
 STRUTIL_INLINE bool contains(const Unit* set, unsigned unit) {
-  if (isSmall) return strChr(set, unit) != nullptr;
   for (unsigned one = *set; one != 0; one = *++set) {
     if (one == unit) return true;
   }
   return false;
 }
 
-// Returns the first place whose unit is in the set, or the terminator. Most sets are of one unit.
+// Returns the first position whose unit is in the set, or that of the terminator. Most sets have
+// one unit.
 template <typename Unit>
 STRUTIL_INLINE Unit* findOneOf(Unit* str, const Unit* set) {
   const unsigned only = *set;
-  if (!isSmall && (only == 0 || set[1] == 0)) {
-    walk(Unbounded{}, [only](unsigned unit) { return unit != only && unit != 0; }, str);
+  if (STRUTIL_FAST && (only == 0 || set[1] == 0)) {
+    const auto isOther = [only](unsigned unit) { return unit != only && unit != 0; };
+    walk(Unbounded{}, isOther, str);
   } else {
     while (*str != 0 && !contains(set, *str)) ++str;
   }
@@ -357,7 +370,7 @@ STRUTIL_INLINE Unit* findOneOf(Unit* str, const Unit* set) {
 }
 
 template <typename Unit>
-STRUTIL_CORE Unit* token(Unit* str, int* off, const Unit* dlmt) {
+STRUTIL_INLINE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   if (!str || !off || !dlmt) return nullptr;
   Unit* start = str + *off;
   while (contains(dlmt, *start)) ++start;
@@ -369,17 +382,22 @@ STRUTIL_CORE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   return start;
 }
 
+// The small code calls `strToken`, which is StrToken or WStrToken, instead of repeating its loops.
 template <typename Text>
-int split(Text* str, const Text* dlmt, Text** wrd) {
+int split(Text* str, const Text* dlmt, Text** wrd, Text* strToken(Text*, int*, const Text*)) {
   if (!wrd) return 0;
   int off = 0;
   int num = 0;
-  while (auto* const tk = token(units(str), &off, units(dlmt))) wrd[num++] = text(tk);
+  while (Text* const tk = STRUTIL_FAST ? text(token(units(str), &off, units(dlmt)))
+                                       : strToken(str, &off, dlmt)) {
+    wrd[num++] = tk;
+  }
   return num;
 }
 
 // Trimming
 
+// Pairs such as this one let a template call the function of its own width.
 void strCopy(Byte* dst, const Byte* src) { StrCopy(text(dst), text(src)); }
 void strCopy(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
 
@@ -390,7 +408,7 @@ int trim(Unit* str, const Unit* trimSet) {
   if (trimSet) {
     while (contains(trimSet, *first)) ++first;
   }
-  Unit* end = first + lengthOf(first);
+  Unit* end = first + length(first);
   if (trimSet) {
     while (end > first + 1 && contains(trimSet, end[-1])) --end;
   }
@@ -402,6 +420,8 @@ int trim(Unit* str, const Unit* trimSet) {
 
 // Replacing
 
+int strLen(const Byte* str) { return StrLen(text(str)); }
+int strLen(const WCHAR* str) { return WStrLen(str); }
 const Byte* strStr(const Byte* str, const Byte* sub) { return units(StrStr(text(str), text(sub))); }
 const WCHAR* strStr(const WCHAR* str, const WCHAR* sub) { return WStrStr(str, sub); }
 
@@ -426,7 +446,7 @@ int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
   Unit* to = result;
   const unsigned first = *rep;
   for (;;) {
-    const auto copyOther = [first](Unit& unit, unsigned from) {
+    const auto copyOther = [first](Unit& unit, unsigned from) STRUTIL_LAMBDA {
       if (from == first) return false;
       return (unit = static_cast<Unit>(from)) != 0;
     };
@@ -446,7 +466,8 @@ int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
 
 // Integer text conversion
 
-// By name where there is one: unoptimised builds, and Clang, would call one for each result.
+// Calls __aeabi_idivmod by name where the target has it: Clang, and GCC without optimisation, would
+// call one routine for the quotient and another for the remainder.
 int divide(int dividend, int divisor, int& remainder) {
 #if defined(__ARM_EABI__) && !defined(__ARM_FEATURE_IDIV) && !defined(__ARM_BIG_ENDIAN)
   const uint64_t both = __aeabi_idivmod(dividend, divisor);
@@ -495,7 +516,7 @@ int toInt(const Unit* string) {
   const bool negative = *string == '-';
   if (negative) ++string;
   unsigned val = 0;
-  const auto addDigit = [&val](unsigned unit) {
+  const auto addDigit = [&val](unsigned unit) STRUTIL_LAMBDA {
     const unsigned digit = unit - '0';
     if (digit > 9) return false;
     val = val * 10 + digit;
@@ -508,15 +529,15 @@ int toInt(const Unit* string) {
 // Width conversion
 
 template <typename To, typename From>
-STRUTIL_CORE void copyCount(To*& des, const From*& src, int count) {
-  const auto copyUnit = [](To& to, From from) { return to = from, true; };
+STRUTIL_INLINE void copyCount(To* des, const From* src, int count) {
+  const auto copyUnit = [](To& to, From from) STRUTIL_LAMBDA { return to = from, true; };
   walk(Count{count}, copyUnit, des, src);
 }
 
-#if defined(STRUTIL_ALIASING)
-// Two units in one word. Word by word is also unit by unit, forward, where the arrays overlap: both
-// being aligned, they are an even number of units apart.
-struct STRUTIL_ALIASING Pair {
+#if defined(__GNUC__)
+// Two units in one word. If the arrays overlap, this is still the copy unit by unit: both being
+// word-aligned, they are an even number of units apart.
+struct [[gnu::may_alias]] Pair {
   uint32_t units;
 };
 bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % sizeof(Pair) == 0; }
@@ -524,14 +545,12 @@ bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % si
 
 STRUTIL_INLINE void copyWords(WORD* des, const WCHAR* src, int len) {
   if (!src || !des || len < 1) return;
-#if defined(STRUTIL_ALIASING)
+#if defined(__GNUC__)
   if (isAligned(src) && isAligned(des)) {
-    Pair* to = static_cast<Pair*>(static_cast<void*>(des));
-    const Pair* from = static_cast<const Pair*>(static_cast<const void*>(src));
-    copyCount(to, from, len >> 1);
-    des = static_cast<WORD*>(static_cast<void*>(to));
-    src = static_cast<const WCHAR*>(static_cast<const void*>(from));
-    if ((len & 1) != 0) *des = *src;
+    const void* const from = src;
+    copyCount(static_cast<Pair*>(static_cast<void*>(des)), static_cast<const Pair*>(from),
+              len >> 1);
+    if ((len & 1) != 0) des[len - 1] = src[len - 1];
     return;
   }
 #endif
@@ -543,7 +562,7 @@ STRUTIL_INLINE Byte* toPrintable(const WCHAR* src, Byte* des, int bufsize) {
   if (!src || bufsize < 1) return des;
   Byte* at = des;
   unsigned unit = 0;
-  const auto copyPrintable = [&unit](Byte& to, unsigned from) {
+  const auto copyPrintable = [&unit](Byte& to, unsigned from) STRUTIL_LAMBDA {
     unit = from;
     if (unit < ' ' || unit > '~') return false;
     to = static_cast<Byte>(unit);
@@ -576,10 +595,10 @@ int StrLen(const char* str) noexcept { return length(units(str)); }
 int WStrLen(const WCHAR* str) noexcept { return length(units(str)); }
 int CharToLower(const int c) noexcept { return isLetterFrom('A', c) ? c + caseBit : c; }
 int CharToUpper(const int c) noexcept { return isLetterFrom('a', c) ? c - caseBit : c; }
-char* StrUpper(char* str) noexcept { return text(switchCase(units(str), 'a', -caseBit)); }
-WCHAR* WStrUpper(WCHAR* str) noexcept { return switchCase(str, 'a', -caseBit); }
-char* StrLower(char* str) noexcept { return text(switchCase(units(str), 'A', caseBit)); }
-WCHAR* WStrLower(WCHAR* str) noexcept { return switchCase(str, 'A', caseBit); }
+char* StrUpper(char* str) noexcept { return text(mapCase(units(str), 'a', -caseBit)); }
+WCHAR* WStrUpper(WCHAR* str) noexcept { return mapCase(str, 'a', -caseBit); }
+char* StrLower(char* str) noexcept { return text(mapCase(units(str), 'A', caseBit)); }
+WCHAR* WStrLower(WCHAR* str) noexcept { return mapCase(str, 'A', caseBit); }
 
 void StrCopy(char* dst, const char* src) noexcept { copy(units(dst), units(src)); }
 void WStrCopy(WCHAR* dst, const WCHAR* src) noexcept { copy(dst, src); }
@@ -590,15 +609,15 @@ void WStrNCopy(WCHAR* dst, const WCHAR* src, int n) noexcept { nCopy(dst, src, n
 
 void StrCat(char* dst, const char* src) noexcept { cat(units(dst), units(src), Unbounded{}); }
 void WStrCat(WCHAR* dst, const WCHAR* src) noexcept { cat(dst, src, Unbounded{}); }
-void StrCatBuf(char* dst, int n, const char* src) noexcept { nCatBuf(units(dst), n, units(src)); }
-void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) noexcept { nCatBuf(dst, n, src); }
+void StrCatBuf(char* dst, int n, const char* src) noexcept { catBuf(units(dst), n, units(src)); }
+void WStrCatBuf(WCHAR* dst, int n, const WCHAR* src) noexcept { catBuf(dst, n, src); }
 void WStrNCat(WCHAR* dst, const WCHAR* src, int num) noexcept { cat(dst, src, Count{num}); }
 void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) noexcept {
-  nCatBuf(dst, n, src, num);
+  catBuf(dst, n, src, num);
 }
 
-// A caller whose plain char is signed passes `c` extended by its sign, and one whose is not by
-// zeros; the compiler trusts that all do as this module does. The low 8 bits count.
+// Callers extend `c` to 32 bits by its sign or by zeros, as their own plain char is, and the
+// compiler expects this file's way. Hiding the value makes it reduce `c` to its low 8 bits.
 char* StrChr(const char* str, const char c) noexcept {
   unsigned unit = static_cast<Byte>(c);
   STRUTIL_OPAQUE(unit);
@@ -618,37 +637,41 @@ WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept {
   return text(find(str, substr, ignoreCase));
 }
 
-int StrNCmp(const char* str1, const char* str2, int n) noexcept {
-  return compare(units(str1), units(str2), Count{n}, exact);
-}
-int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
-  return compare(str1, str2, Count{n}, exact);
-}
-int StrNICmp(const char* str1, const char* str2, int n) noexcept {
-  return compare(units(str1), units(str2), Count{n}, ignoreCaseAndOrder);
-}
-int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
-  return compare(str1, str2, Count{n}, ignoreCase);
-}
 int StrCmp(const char* str1, const char* str2) noexcept {
-  return compare(units(str1), units(str2), Whole{}, exact);
+  return compare(units(str1), units(str2), exact, Unbounded{});
 }
 int WStrCmp(const WCHAR* str1, const WCHAR* str2) noexcept {
-  return compare(str1, str2, Whole{}, exact);
+  return compare(str1, str2, exact, Unbounded{});
 }
 int StrICmp(const char* str1, const char* str2) noexcept {
-  return compare(units(str1), units(str2), Whole{}, ignoreCase);
+  return compare(units(str1), units(str2), ignoreCase, Unbounded{});
 }
 int WStrICmp(const WCHAR* str1, const WCHAR* str2) noexcept {
-  return compare(str1, str2, Whole{}, ignoreCase);
+  return compare(str1, str2, ignoreCase, Unbounded{});
+}
+int StrNCmp(const char* str1, const char* str2, int n) noexcept {
+  return compare(units(str1), units(str2), exact, Count{n});
+}
+int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return compare(str1, str2, exact, Count{n});
+}
+int StrNICmp(const char* str1, const char* str2, int n) noexcept {
+  return compare(units(str1), units(str2), ignoreCaseAndOrder, Count{n});
+}
+int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
+  return compare(str1, str2, ignoreCase, Count{n});
 }
 
 char* StrToken(char* str, int* off, const char* dlmt) noexcept {
   return text(token(units(str), off, units(dlmt)));
 }
 WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }
-int StrSplit(char* str, const char* dlmt, char** wrd) noexcept { return split(str, dlmt, wrd); }
-int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept { return split(str, dlmt, wrd); }
+int StrSplit(char* str, const char* dlmt, char** wrd) noexcept {
+  return split(str, dlmt, wrd, StrToken);
+}
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept {
+  return split(str, dlmt, wrd, WStrToken);
+}
 
 int StrTrim(char* str, const char* trimSet) noexcept { return trim(units(str), units(trimSet)); }
 int WStrTrim(WCHAR* str, const WCHAR* trimSet) noexcept { return trim(str, trimSet); }
