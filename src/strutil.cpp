@@ -13,7 +13,6 @@
 extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOLINT: the ABI's name
 
 // Two codes in one source
-//
 // The fast code unrolls its loops, the small code does not. Builds for size (-Os, -Oz) and builds
 // without optimisation have the small code, all others the fast one. With GCC this file also sets
 // its own optimisation level, so that a Debug build has the machine code of a release.
@@ -62,8 +61,6 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 #pragma GCC optimize("no-if-conversion")     // 0.2 %, and 2.6 % of the small code
 #pragma GCC optimize("no-partial-inlining")  // 0.6 % and 192 bytes: a call in front of a loop
 #define STRUTIL_INLINE [[gnu::always_inline]] inline
-#else
-#define STRUTIL_INLINE inline
 #endif
 
 #if defined(__GNUC__) && !STRUTIL_FAST                 // it would add 264 bytes to GCC's fast code
@@ -76,6 +73,7 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 #define STRUTIL_UNLIKELY(condition) __builtin_expect(condition, 0)  // GCC 2.2 %, Clang 0.8 %
 #define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides from the compiler what it knows
 #else
+#define STRUTIL_INLINE inline
 #define STRUTIL_UNLIKELY(condition) (condition)
 #define STRUTIL_OPAQUE(value) value = const_cast<const volatile unsigned&>(value)
 #endif
@@ -90,8 +88,7 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 
 namespace {
 
-// Narrow strings are read and written as bytes, so that nothing depends on the sign of plain char.
-using Byte = uint8_t;
+using Byte = uint8_t;  // for narrow units: nothing depends on the sign of plain char
 
 STRUTIL_INLINE Byte* units(char* str) { return reinterpret_cast<Byte*>(str); }
 STRUTIL_INLINE const Byte* units(const char* str) { return reinterpret_cast<const Byte*>(str); }
@@ -106,7 +103,7 @@ WCHAR* text(const WCHAR* str) { return const_cast<WCHAR*>(str); }
 // returned true; of it, GCC makes one subtraction and one branch.
 struct Count {
   enum { isCount = true };
-  int left = INT_MAX;
+  int left;
   STRUTIL_INLINE bool take(int count) {
     if (left < count) return false;
     left -= count;
@@ -126,26 +123,19 @@ STRUTIL_INLINE void advance(Unit*& at, uintptr_t count) {
   at = reinterpret_cast<Unit*>(reinterpret_cast<uintptr_t>(at) + count * sizeof(Unit));
 }
 
-template <typename... Unit>
-STRUTIL_INLINE bool stopAfter(uintptr_t count, Unit*&... at) {
-  (..., advance(at, count));
-  return false;
-}
-
 // The loop behind nearly every function. Calls `goesOn` with the unit at each pointer and advances
 // all pointers by one unit, until `goesOn` returns false or the bound is reached; returns whether
 // the bound ended it. The pointers are the caller's own: they are left at the units that `goesOn`
 // rejected, or just past the last ones. The units are references, so that `goesOn` may write them.
-// `goesOn` comes by reference, since GCC's -Og would copy it with memcpy.
 template <typename Bound, typename GoesOn, typename... Unit>
 STRUTIL_INLINE bool walk(Bound bound, const GoesOn& goesOn, Unit*&... at) {
   if constexpr (STRUTIL_FAST) {
     // Unrolled: addition, branch and bound take half the cycles of a simple step.
     for (; bound.take(4); (..., advance(at, 4))) {
       if (STRUTIL_UNLIKELY(!goesOn(at[0]...))) return false;
-      if (STRUTIL_UNLIKELY(!goesOn(at[1]...))) return stopAfter(1, at...);
-      if (STRUTIL_UNLIKELY(!goesOn(at[2]...))) return stopAfter(2, at...);
-      if (STRUTIL_UNLIKELY(!goesOn(at[3]...))) return stopAfter(3, at...);
+      if (STRUTIL_UNLIKELY(!goesOn(at[1]...))) return (..., advance(at, 1)), false;
+      if (STRUTIL_UNLIKELY(!goesOn(at[2]...))) return (..., advance(at, 2)), false;
+      if (STRUTIL_UNLIKELY(!goesOn(at[3]...))) return (..., advance(at, 3)), false;
     }
   } else if constexpr (Bound::isCount) {
     if (!bound.take(1)) return true;
@@ -173,7 +163,6 @@ STRUTIL_INLINE Value notHoisted(Value value) {
 // Lengths and case mapping
 
 enum { caseBit = 'a' - 'A' };  // in which the two cases of a letter differ
-
 bool isLetterFrom(unsigned first, int c) { return static_cast<unsigned>(c) - first < 26; }
 
 template <typename Unit>
@@ -213,8 +202,11 @@ STRUTIL_INLINE To* copyUnits(To* dst, const From* src, Bound bound, AtBound atBo
 template <typename Unit>
 STRUTIL_INLINE void copy(Unit* dst, const Unit* src) {
   if (!dst || dst == src) return;
-  if (!src) *dst = 0;
-  if (src) copyUnits(dst, src, Unbounded{}, stop);
+  if (src) {
+    copyUnits(dst, src, Unbounded{}, stop);
+  } else {
+    *dst = 0;
+  }
 }
 
 template <typename Unit>
@@ -249,7 +241,7 @@ STRUTIL_INLINE void catBuf(Unit* dst, int n, const Unit* src, int num = INT_MAX)
 // Searching
 
 // The last is for StrNICmp, whose contract makes every difference negative.
-enum CaseRule { exact, ignoreCase, ignoreCaseAndOrder };
+enum CaseRule { exact, anyCase, anyCaseUnordered };
 
 // Whether two units that differ are the two cases of one letter.
 STRUTIL_INLINE bool differInCaseOnly(int a, int b) {
@@ -279,7 +271,7 @@ STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule ru
   if (!str || !substr || *str == 0) return nullptr;
   const int first = *substr;
   if (first == 0) return str;
-  const bool hasCases = rule == ignoreCase && isLetterFrom('a', first | caseBit);
+  const bool hasCases = rule == anyCase && isLetterFrom('a', first | caseBit);
   const int other = hasCases ? first ^ caseBit : first;
   for (;; ++str) {
     const Unit* match = nullptr;
@@ -298,7 +290,7 @@ STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule ru
     const auto isSame = [=, &lastOfStr, &lastOfSubstr](int unit, int wanted) STRUTIL_LAMBDA {
       lastOfStr = unit;
       lastOfSubstr = wanted;
-      if (unit != wanted) return rule == ignoreCase && differInCaseOnly(unit, wanted);
+      if (unit != wanted) return rule == anyCase && differInCaseOnly(unit, wanted);
       if (wanted == 0) return false;  // "return wanted != 0" takes GCC 1.4 % and 236 bytes more
       return true;
     };
@@ -312,8 +304,8 @@ STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule ru
 
 // Returns 0, or the position i + 1 of the first difference, negative if the unit of str1 is the
 // smaller one. Only two units that differ are mapped to lowercase, to find which is the smaller.
-template <typename Unit, typename Bound>
-STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bound bound) {
+template <typename Unit, typename Bound = Unbounded>
+STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bound bound = {}) {
   if (!str1 || !str2) return (str1 ? 1 : 0) - (str2 ? 1 : 0);
   if (str1 == str2) return 0;
   const Unit* at = str1;
@@ -321,7 +313,7 @@ STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bo
   bool differ = false;
   int a = 0;
   int b = 0;
-  const auto match = [=, &differ, &a, &b](int unit1, int unit2) STRUTIL_LAMBDA {
+  const auto isSame = [=, &differ, &a, &b](int unit1, int unit2) STRUTIL_LAMBDA {
     a = unit1;
     b = unit2;
     if (STRUTIL_UNLIKELY(a != b)) {
@@ -331,12 +323,12 @@ STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bo
     }
     return unit2 != 0;
   };
-  walk(bound, match, at, str2);
+  walk(bound, isSame, at, str2);
   if (!differ) return notHoisted(0);
   STRUTIL_PARK(str1);
   const int position = static_cast<int>(at - str1) + 1;
-  if (rule == ignoreCaseAndOrder) return -position;
-  if (rule == ignoreCase) {
+  if (rule == anyCaseUnordered) return -position;
+  if (rule == anyCase) {
     a = CharToLower(a);
     b = CharToLower(b);
   }
@@ -355,11 +347,10 @@ STRUTIL_INLINE bool contains(const Unit* set, unsigned unit) {
   return false;
 }
 
-// Returns the first position whose unit is in the set, or that of the terminator. Most sets have
-// one unit.
+// Returns the first position whose unit is in the set, or the terminator's.
 template <typename Unit>
 STRUTIL_INLINE Unit* findOneOf(Unit* str, const Unit* set) {
-  const unsigned only = *set;
+  const unsigned only = *set;  // most sets have one unit
   if (STRUTIL_FAST && (only == 0 || set[1] == 0)) {
     const auto isOther = [only](unsigned unit) { return unit != only && unit != 0; };
     walk(Unbounded{}, isOther, str);
@@ -382,22 +373,25 @@ STRUTIL_INLINE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   return start;
 }
 
-// The small code calls `strToken`, which is StrToken or WStrToken, instead of repeating its loops.
+// Pairs such as this one let a template call the function of its own width.
+char* strToken(char* str, int* off, const char* dlmt) { return StrToken(str, off, dlmt); }
+WCHAR* strToken(WCHAR* str, int* off, const WCHAR* dlmt) { return WStrToken(str, off, dlmt); }
+
+// The small code calls StrToken instead of repeating its loops.
 template <typename Text>
-int split(Text* str, const Text* dlmt, Text** wrd, Text* strToken(Text*, int*, const Text*)) {
+int split(Text* str, const Text* dlmt, Text** wrd) {
   if (!wrd) return 0;
   int off = 0;
   int num = 0;
-  while (Text* const tk = STRUTIL_FAST ? text(token(units(str), &off, units(dlmt)))
-                                       : strToken(str, &off, dlmt)) {
-    wrd[num++] = tk;
-  }
+  const auto next = [&] {
+    return STRUTIL_FAST ? text(token(units(str), &off, units(dlmt))) : strToken(str, &off, dlmt);
+  };
+  while (Text* const tk = next()) wrd[num++] = tk;
   return num;
 }
 
 // Trimming
 
-// Pairs such as this one let a template call the function of its own width.
 void strCopy(Byte* dst, const Byte* src) { StrCopy(text(dst), text(src)); }
 void strCopy(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
 
@@ -413,9 +407,8 @@ int trim(Unit* str, const Unit* trimSet) {
     while (end > first + 1 && contains(trimSet, end[-1])) --end;
   }
   *end = 0;
-  const int kept = static_cast<int>(end - first);
   if (first != str) strCopy(str, first);
-  return kept;
+  return static_cast<int>(end - first);
 }
 
 // Replacing
@@ -466,8 +459,7 @@ int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
 
 // Integer text conversion
 
-// Calls __aeabi_idivmod by name where the target has it: Clang, and GCC without optimisation, would
-// call one routine for the quotient and another for the remainder.
+// Calls __aeabi_idivmod by name, since Clang would call one routine for each of the two results.
 int divide(int dividend, int divisor, int& remainder) {
 #if defined(__ARM_EABI__) && !defined(__ARM_FEATURE_IDIV) && !defined(__ARM_BIG_ENDIAN)
   const uint64_t both = __aeabi_idivmod(dividend, divisor);
@@ -534,19 +526,15 @@ STRUTIL_INLINE void copyCount(To* des, const From* src, int count) {
   walk(Count{count}, copyUnit, des, src);
 }
 
-#if defined(__GNUC__)
-// Two units in one word. If the arrays overlap, this is still the copy unit by unit: both being
-// word-aligned, they are an even number of units apart.
-struct [[gnu::may_alias]] Pair {
-  uint32_t units;
-};
-bool isAligned(const void* pair) { return reinterpret_cast<uintptr_t>(pair) % sizeof(Pair) == 0; }
-#endif
-
+// Copies two units at once where both arrays are word-aligned. If they overlap, this is still the
+// copy unit by unit, since they are an even number of units apart.
 STRUTIL_INLINE void copyWords(WORD* des, const WCHAR* src, int len) {
   if (!src || !des || len < 1) return;
 #if defined(__GNUC__)
-  if (isAligned(src) && isAligned(des)) {
+  struct [[gnu::may_alias]] Pair {
+    uint32_t units;
+  };
+  if ((reinterpret_cast<uintptr_t>(src) | reinterpret_cast<uintptr_t>(des)) % sizeof(Pair) == 0) {
     const void* const from = src;
     copyCount(static_cast<Pair*>(static_cast<void*>(des)), static_cast<const Pair*>(from),
               len >> 1);
@@ -568,13 +556,11 @@ STRUTIL_INLINE Byte* toPrintable(const WCHAR* src, Byte* des, int bufsize) {
     to = static_cast<Byte>(unit);
     return true;
   };
-  // How many units fit before the terminator.
-  const auto room = [&] { return bufsize - 1 - static_cast<int>(at - des); };
+  const auto room = [&] { return bufsize - 1 - static_cast<int>(at - des); };  // but the terminator
   while (!walk(Count{room()}, copyPrintable, at, src) && unit != 0) {
     int shift = 12;  // of the first digit
     while (shift > 0 && unit >> shift == 0) shift -= 4;
-    const int digits = (shift >> 2) + 1;
-    if (room() < 4 + digits + 1) break;
+    if (room() < 6 + (shift >> 2)) break;  // "&(0x", the digits and ")"
     *at++ = '&';
     *at++ = '(';
     *at++ = '0';
@@ -631,24 +617,20 @@ WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) noexcept {
   return text(find(str, substr, exact));
 }
 char* StrIStr(const char* str, const char* substr) noexcept {
-  return text(find(units(str), units(substr), ignoreCase));
+  return text(find(units(str), units(substr), anyCase));
 }
 WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept {
-  return text(find(str, substr, ignoreCase));
+  return text(find(str, substr, anyCase));
 }
 
 int StrCmp(const char* str1, const char* str2) noexcept {
-  return compare(units(str1), units(str2), exact, Unbounded{});
+  return compare(units(str1), units(str2), exact);
 }
-int WStrCmp(const WCHAR* str1, const WCHAR* str2) noexcept {
-  return compare(str1, str2, exact, Unbounded{});
-}
+int WStrCmp(const WCHAR* str1, const WCHAR* str2) noexcept { return compare(str1, str2, exact); }
 int StrICmp(const char* str1, const char* str2) noexcept {
-  return compare(units(str1), units(str2), ignoreCase, Unbounded{});
+  return compare(units(str1), units(str2), anyCase);
 }
-int WStrICmp(const WCHAR* str1, const WCHAR* str2) noexcept {
-  return compare(str1, str2, ignoreCase, Unbounded{});
-}
+int WStrICmp(const WCHAR* str1, const WCHAR* str2) noexcept { return compare(str1, str2, anyCase); }
 int StrNCmp(const char* str1, const char* str2, int n) noexcept {
   return compare(units(str1), units(str2), exact, Count{n});
 }
@@ -656,22 +638,18 @@ int WStrNCmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
   return compare(str1, str2, exact, Count{n});
 }
 int StrNICmp(const char* str1, const char* str2, int n) noexcept {
-  return compare(units(str1), units(str2), ignoreCaseAndOrder, Count{n});
+  return compare(units(str1), units(str2), anyCaseUnordered, Count{n});
 }
 int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
-  return compare(str1, str2, ignoreCase, Count{n});
+  return compare(str1, str2, anyCase, Count{n});
 }
 
 char* StrToken(char* str, int* off, const char* dlmt) noexcept {
   return text(token(units(str), off, units(dlmt)));
 }
 WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }
-int StrSplit(char* str, const char* dlmt, char** wrd) noexcept {
-  return split(str, dlmt, wrd, StrToken);
-}
-int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept {
-  return split(str, dlmt, wrd, WStrToken);
-}
+int StrSplit(char* str, const char* dlmt, char** wrd) noexcept { return split(str, dlmt, wrd); }
+int WStrSplit(WCHAR* str, const WCHAR* dlmt, WCHAR** wrd) noexcept { return split(str, dlmt, wrd); }
 
 int StrTrim(char* str, const char* trimSet) noexcept { return trim(units(str), units(trimSet)); }
 int WStrTrim(WCHAR* str, const WCHAR* trimSet) noexcept { return trim(str, trimSet); }
@@ -693,8 +671,7 @@ int StrToInt(const char* string) noexcept { return toInt(units(string)); }
 int WStrToInt(const WCHAR* string) noexcept { return toInt(string); }
 
 void BytesToWords(const char* src, WORD* des, int len) noexcept {
-  const Byte* from = units(src);
-  if (from && des) copyCount(des, from, len);
+  if (src && des) copyCount(des, units(src), len);
 }
 WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) noexcept {
   if (!des) return nullptr;
