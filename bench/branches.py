@@ -4,6 +4,8 @@ from collections import Counter
 # By function: how many ways, and the reason. A number that is too high fails as well.
 NOT_EMPTY = 1, "asks whether a set is empty, of which a unit was just found"
 DIFFERS = 1, "asks for the end of the pattern, of which a unit just differed"
+IN_SET = 1, "asks whether a unit is the terminator that was just found in the set"
+HAS_ROOM = 1, "asks whether a unit may be appended, where the capacity has room for one"
 DIVISION = {
     "__aeabi_idiv": (10, "the only negative dividend is the most negative int; no divisor is negative, and 1 "
                          "divides 0 alone"),
@@ -13,7 +15,8 @@ NEVER = {
     "gcc-O2": {"WStrToken": NOT_EMPTY, "StrSplit": NOT_EMPTY, "WStrSplit": NOT_EMPTY,
                "StrReplace": DIFFERS, "WStrReplace": DIFFERS, **DIVISION},
     "clang-O2": DIVISION,
-    "gcc-Os": DIVISION,
+    "gcc-Os": {"StrCatBuf": HAS_ROOM, "WStrCatBuf": HAS_ROOM, "StrToken": IN_SET, "WStrToken": IN_SET,
+               **DIVISION},
 }
 
 
