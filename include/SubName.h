@@ -1,8 +1,10 @@
 /**
  * @file
- * Gives each API name its numbered link symbol, so that callers write the names and link against
- * the numbers. These are plain macros: they rewrite such an identifier wherever it stands after
- * this header, members and local names included.
+ * Gives each function name its numbered link symbol: callers write the names and link against the
+ * numbers. The documentation of each function is in strutil.h.
+ *
+ * These are plain macros. They replace such an identifier everywhere after this header, class
+ * members and local names included.
  */
 #ifndef STRUTIL_SUBNAME_H
 #define STRUTIL_SUBNAME_H
@@ -19,16 +21,16 @@
 
 /* Copying */
 #define StrCopy VELKO_002009
-#define StrCopyBuf VELKO_002010
 #define WStrCopy VELKO_002034
+#define StrCopyBuf VELKO_002010
 #define WStrCopyBuf VELKO_002035
 #define StrNCopy VELKO_002017
 #define WStrNCopy VELKO_002044
 
 /* Concatenation */
 #define StrCat VELKO_002005
-#define StrCatBuf VELKO_002006
 #define WStrCat VELKO_002030
+#define StrCatBuf VELKO_002006
 #define WStrCatBuf VELKO_002031
 #define WStrNCat VELKO_002041
 #define WStrNCatBuf VELKO_002042
@@ -42,14 +44,14 @@
 #define WStrIStr VELKO_002038
 
 /* Comparison */
-#define StrNCmp VELKO_002016
-#define WStrNCmp VELKO_002043
-#define StrNICmp VELKO_002019
-#define WStrNICmp VELKO_002046
 #define StrCmp VELKO_002008
 #define WStrCmp VELKO_002033
 #define StrICmp VELKO_002012
 #define WStrICmp VELKO_002037
+#define StrNCmp VELKO_002016
+#define WStrNCmp VELKO_002043
+#define StrNICmp VELKO_002019
+#define WStrNICmp VELKO_002046
 
 /* Tokenizing and splitting */
 #define StrToken VELKO_002023
