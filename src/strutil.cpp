@@ -4,32 +4,32 @@
 
 #include <limits.h>
 
-#if defined(__arm__) && !defined(__thumb__) && __ARM_ARCH < 6  // links, and hangs a Cortex-M
-#error "ARM code: give the C++ compiler the processor, such as -mcpu=cortex-m0plus, or -mthumb"
+#if defined(__arm__) && !defined(__thumb__) && __ARM_ARCH < 6  // links, but no Cortex-M can run it
+#error "A32 code: give the C++ compiler the processor, such as -mcpu=cortex-m0plus, or -mthumb"
 #endif
 
-// The runtime's division: the quotient is the low word, the remainder the high one. It is declared
-// before the attributes below, since Clang allows no_builtin on definitions only.
+// From the compiler's runtime: the quotient is the low word, the remainder the high one. It is
+// declared before the attributes below, because Clang allows no_builtin on definitions only.
 extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOLINT: the ABI's name
 
 // Two codes in one source
 // The fast code unrolls its loops, the small code does not. Builds for size (-Os, -Oz) and builds
-// without optimisation have the small code, all others the fast one. With GCC this file also sets
-// its own optimisation level, so that a Debug build has the machine code of a release.
+// without optimisation (-O0) get the small code, all others get the fast one. With GCC this file
+// also sets its own optimisation level, so a Debug build has the machine code of a release.
 #if defined(__OPTIMIZE__) && !defined(__OPTIMIZE_SIZE__)
 #define STRUTIL_FAST 1
 #else
 #define STRUTIL_FAST 0
 #endif
 
-// Options for this file, since users' flags cannot be relied on. First what keeps promises: no call
-// of a C library, no constant data, no unwind tables. Without one of these lines tests/check-object
-// fails, or the test that the line names.
+// Options for this file, because users' flags cannot be relied on. First those that keep promises:
+// no call of a C library, no constant data, no unwind tables. Without any of these lines
+// tests/check-object fails, or the test that the line names.
 #if defined(__clang__)
 #pragma clang attribute push
-#pragma clang attribute(__attribute__((no_builtin)), apply_to = function)  // Clang 22: strlen
+#pragma clang attribute(__attribute__((no_builtin)), apply_to = function)  // strlen (Clang 22)
 #pragma clang attribute(__attribute__((no_stack_protector)), apply_to = function)
-#pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))  // tables
+#pragma clang attribute(__attribute__((nothrow)), apply_to = hasType(functionType))  // unwinding
 #elif defined(__GNUC__)
 #pragma GCC push_options
 #if STRUTIL_FAST
@@ -41,45 +41,45 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 #if __GNUC__ >= 12
 #pragma GCC optimize("trivial-auto-var-init=uninitialized")  // memset
 #endif
-// Loops become calls, or vectors with constant data. The first also saves 2.4 % and 388 bytes.
+// Loops become library calls, or vectors with constant data. The first also costs 2.4 %, 388 bytes.
 #pragma GCC optimize("no-tree-loop-optimize", "no-tree-slp-vectorize")
 // Wrong code from GCC 12 at "-Os -fno-inline-small-functions -fno-inline-functions-called-once": a
 // caller keeps values in r1 to r3 across a call that overwrites them. The test is suite_calls.
 #pragma GCC optimize("no-ipa-ra")
 #endif
 
-// Then what saves cycles or bytes. A figure says how much more the fast code takes without the
+// Then those that save cycles or bytes. A figure says how much more the fast code takes WITHOUT the
 // line: cycles as the geometric mean of the benchmark's calls of 4 units and more, bytes of all
 // functions, with GCC 12 or Clang 19 for the Cortex-M0+.
 #if defined(__clang__)
 // Clang would unroll the unrolled loops again: 5.1 %, 2,966 bytes.
 #pragma clang attribute(__attribute__((minsize)), apply_to = function)
-#define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // flatten: of lambdas, 74 %
+#define STRUTIL_INLINE [[gnu::always_inline, gnu::flatten]] inline  // flatten, for lambdas: 74 %
 #elif defined(__GNUC__)
-// These keep more values at once than there are low registers: 0.3, 0.5 and 0.6 %.
+// These three optimisations keep more values at once than there are low registers: 0.3, 0.5, 0.6 %.
 #pragma GCC optimize("no-tree-pre", "no-move-loop-invariants", "no-schedule-insns")
 #pragma GCC optimize("no-if-conversion")     // 0.2 %, and 2.6 % of the small code
 #pragma GCC optimize("no-partial-inlining")  // 0.6 % and 192 bytes: a call in front of a loop
 #define STRUTIL_INLINE [[gnu::always_inline]] inline
 #endif
 
-#if defined(__GNUC__) && !STRUTIL_FAST                 // it would add 264 bytes to GCC's fast code
-#define STRUTIL_LAMBDA __attribute__((always_inline))  // or GCC 8 keeps the captures in memory
+#if defined(__GNUC__) && !STRUTIL_FAST                 // GCC's fast code would take 264 bytes more
+#define STRUTIL_LAMBDA __attribute__((always_inline))  // without it, GCC 8 has captures in memory
 #else
 #define STRUTIL_LAMBDA
 #endif
 
-#if defined(__GNUC__)                                               // Clang defines it, too
+#if defined(__GNUC__)                                               // GCC and Clang
 #define STRUTIL_UNLIKELY(condition) __builtin_expect(condition, 0)  // GCC 2.2 %, Clang 0.8 %
-#define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides from the compiler what it knows
+#define STRUTIL_OPAQUE(value) __asm__("" : "+r"(value))  // hides the value from the optimiser
 #else
 #define STRUTIL_INLINE inline
 #define STRUTIL_UNLIKELY(condition) (condition)
 #define STRUTIL_OPAQUE(value) value = const_cast<const volatile unsigned&>(value)
 #endif
 
-// Keeps a value that a loop does not need in a high register (r8 to r12), so that the loop has the
-// low ones: 0.6 % with GCC, 0.8 % with Clang, which needs it before the loop and behind it.
+// Moves a value that a loop does not need to a high register: 0.6 % with GCC, 0.8 % with Clang. It
+// stands before the loop and again after it: with one of them, Clang keeps a low register occupied.
 #if defined(__thumb__) && !defined(__thumb2__) && STRUTIL_FAST
 #define STRUTIL_PARK(value) __asm__("" : "+h"(value))
 #else
@@ -95,12 +95,12 @@ STRUTIL_INLINE const Byte* units(const char* str) { return reinterpret_cast<cons
 STRUTIL_INLINE WCHAR* units(WCHAR* str) { return str; }
 STRUTIL_INLINE const WCHAR* units(const WCHAR* str) { return str; }
 
-// Back to the type of the API, which returns pointers into const strings as non-const.
-char* text(const Byte* str) { return reinterpret_cast<char*>(const_cast<Byte*>(str)); }
-WCHAR* text(const WCHAR* str) { return const_cast<WCHAR*>(str); }
+// Back to the types of the API, which returns pointers into const strings as non-const.
+char* api(const Byte* str) { return reinterpret_cast<char*>(const_cast<Byte*>(str)); }
+WCHAR* api(const WCHAR* str) { return const_cast<WCHAR*>(str); }
 
-// Bounds of a loop: whether it may take so many more units. takeNext() may only follow a call that
-// returned true; of it, GCC makes one subtraction and one branch.
+// Bounds of a loop. take() says whether it may take so many more units. takeNext() may be called
+// only after a call that returned true: GCC makes one subtraction and one branch of it.
 struct Count {
   enum { isCount = true };
   int left;
@@ -117,7 +117,7 @@ struct Unbounded {
   static bool take(int) { return true; }  // STRUTIL_INLINE would cost the small code 5 %
 };
 
-// As an integer, or Clang would split a pointer that moves into several: 8.5 % and 528 bytes.
+// Adds as integers, because Clang would turn one moving pointer into several: 8.5 % and 528 bytes.
 template <typename Unit>
 STRUTIL_INLINE void advance(Unit*& at, uintptr_t count) {
   at = reinterpret_cast<Unit*>(reinterpret_cast<uintptr_t>(at) + count * sizeof(Unit));
@@ -125,8 +125,8 @@ STRUTIL_INLINE void advance(Unit*& at, uintptr_t count) {
 
 // The loop behind nearly every function. Calls `goesOn` with the unit at each pointer and advances
 // all pointers by one unit, until `goesOn` returns false or the bound is reached; returns whether
-// the bound ended it. The pointers are the caller's own: they are left at the units that `goesOn`
-// rejected, or just past the last ones. The units are references, so that `goesOn` may write them.
+// the bound ended it. The units are references: `goesOn` may write them or take their addresses.
+// The pointers are the caller's own: left at the units that `goesOn` rejected, or past the last.
 template <typename Bound, typename GoesOn, typename... Unit>
 STRUTIL_INLINE bool walk(Bound bound, const GoesOn& goesOn, Unit*&... at) {
   if constexpr (STRUTIL_FAST) {
@@ -151,7 +151,7 @@ STRUTIL_INLINE bool walk(Bound bound, const GoesOn& goesOn, Unit*&... at) {
   return true;
 }
 
-// Stops Clang from loading a constant before the loop, where it would occupy a register: 1.0 %.
+// Stops Clang from hoisting a constant above the loop, where it would occupy a register: 1.0 %.
 template <typename Value>
 STRUTIL_INLINE Value notHoisted(Value value) {
 #if defined(__clang__)
@@ -264,8 +264,8 @@ STRUTIL_INLINE Unit* findUnit(Unit* str, unsigned c) {
   return match;
 }
 
-// Searches for the first unit of `substr` before it compares the rest. If the rest fails at the
-// terminator of `str`, no later position has room for `substr`.
+// Searches for the first unit of `substr`, then compares the rest. If that ends at the terminator
+// of `str`, no later position has room for `substr`.
 template <typename Unit>
 STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule rule) {
   if (!str || !substr || *str == 0) return nullptr;
@@ -285,13 +285,13 @@ STRUTIL_INLINE const Unit* find(const Unit* str, const Unit* substr, CaseRule ru
     str = match;
     const Unit* at = str + 1;
     const Unit* rest = substr + 1;
-    int lastOfStr = 0;  // the units that ended the comparison
+    int lastOfStr = 0;  // these two are the units that ended the comparison
     int lastOfSubstr = 0;
     const auto isSame = [=, &lastOfStr, &lastOfSubstr](int unit, int wanted) STRUTIL_LAMBDA {
       lastOfStr = unit;
       lastOfSubstr = wanted;
       if (unit != wanted) return rule == anyCase && differInCaseOnly(unit, wanted);
-      if (wanted == 0) return false;  // "return wanted != 0" takes GCC 1.4 % and 236 bytes more
+      if (wanted == 0) return false;  // GCC: "return wanted != 0" takes 1.4 % and 236 bytes more
       return true;
     };
     walk(Unbounded{}, isSame, at, rest);
@@ -337,8 +337,8 @@ STRUTIL_INLINE int compare(const Unit* str1, const Unit* str2, CaseRule rule, Bo
 
 // Tokenizing and splitting
 
-// The terminator is in no set, so that a loop that skips the units of a set ends with the string.
-// Sets are short: an unrolled loop would take longer to start than it saves.
+// A set never contains the terminator, so a loop that skips units of a set stops at the end of the
+// string without a test for it. Sets are short: unrolling would cost more than it saves.
 template <typename Unit>
 STRUTIL_INLINE bool contains(const Unit* set, unsigned unit) {
   for (unsigned one = *set; one != 0; one = *++set) {
@@ -347,7 +347,7 @@ STRUTIL_INLINE bool contains(const Unit* set, unsigned unit) {
   return false;
 }
 
-// Returns the first position whose unit is in the set, or the terminator's.
+// Returns a pointer to the first unit that is in the set, or to the terminator.
 template <typename Unit>
 STRUTIL_INLINE Unit* findOneOf(Unit* str, const Unit* set) {
   const unsigned only = *set;  // most sets have one unit
@@ -373,26 +373,26 @@ STRUTIL_INLINE Unit* token(Unit* str, int* off, const Unit* dlmt) {
   return start;
 }
 
-// Pairs such as this one let a template call the function of its own width.
+// An overload pair such as this one lets a template call the exported function of its own width.
 char* strToken(char* str, int* off, const char* dlmt) { return StrToken(str, off, dlmt); }
 WCHAR* strToken(WCHAR* str, int* off, const WCHAR* dlmt) { return WStrToken(str, off, dlmt); }
 
 // The small code calls StrToken instead of repeating its loops.
-template <typename Text>
-int split(Text* str, const Text* dlmt, Text** wrd) {
+template <typename Char>
+int split(Char* str, const Char* dlmt, Char** wrd) {
   if (!wrd) return 0;
   int off = 0;
   int num = 0;
   const auto next = [&] {
-    return STRUTIL_FAST ? text(token(units(str), &off, units(dlmt))) : strToken(str, &off, dlmt);
+    return STRUTIL_FAST ? api(token(units(str), &off, units(dlmt))) : strToken(str, &off, dlmt);
   };
-  while (Text* const tk = next()) wrd[num++] = tk;
+  while (Char* const tk = next()) wrd[num++] = tk;
   return num;
 }
 
 // Trimming
 
-void strCopy(Byte* dst, const Byte* src) { StrCopy(text(dst), text(src)); }
+void strCopy(Byte* dst, const Byte* src) { StrCopy(api(dst), api(src)); }
 void strCopy(WCHAR* dst, const WCHAR* src) { WStrCopy(dst, src); }
 
 template <typename Unit>
@@ -413,12 +413,12 @@ int trim(Unit* str, const Unit* trimSet) {
 
 // Replacing
 
-int strLen(const Byte* str) { return StrLen(text(str)); }
+int strLen(const Byte* str) { return StrLen(api(str)); }
 int strLen(const WCHAR* str) { return WStrLen(str); }
-const Byte* strStr(const Byte* str, const Byte* sub) { return units(StrStr(text(str), text(sub))); }
+const Byte* strStr(const Byte* str, const Byte* sub) { return units(StrStr(api(str), api(sub))); }
 const WCHAR* strStr(const WCHAR* str, const WCHAR* sub) { return WStrStr(str, sub); }
 
-// A length that is too great for an int wraps.
+// A length that is too large for an int wraps.
 template <typename Unit>
 int replacedLength(const Unit* orig, const Unit* rep, const Unit* with) {
   const int len_rep = strLen(rep);
@@ -430,8 +430,8 @@ int replacedLength(const Unit* orig, const Unit* rep, const Unit* with) {
   return static_cast<int>(length + static_cast<unsigned>(strLen(orig)));
 }
 
-// Copies while it looks for the first unit of `rep`. `result` may be `orig` where nothing is to be
-// replaced, and then nothing is written.
+// Copies while it searches for the first unit of `rep`. `result` may be `orig` if `rep` does not
+// occur in it; then nothing is written.
 template <typename Unit>
 int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
   if (!orig || !rep || *rep == 0 || !with) return 0;
@@ -459,7 +459,7 @@ int replace(const Unit* orig, const Unit* rep, const Unit* with, Unit* result) {
 
 // Integer text conversion
 
-// Calls __aeabi_idivmod by name, since Clang would call one routine for each of the two results.
+// Calls __aeabi_idivmod by name, because Clang would call two routines for the two results.
 int divide(int dividend, int divisor, int& remainder) {
 #if defined(__ARM_EABI__) && !defined(__ARM_FEATURE_IDIV) && !defined(__ARM_BIG_ENDIAN)
   const uint64_t both = __aeabi_idivmod(dividend, divisor);
@@ -556,7 +556,7 @@ STRUTIL_INLINE Byte* toPrintable(const WCHAR* src, Byte* des, int bufsize) {
     to = static_cast<Byte>(unit);
     return true;
   };
-  const auto room = [&] { return bufsize - 1 - static_cast<int>(at - des); };  // but the terminator
+  const auto room = [&] { return bufsize - 1 - static_cast<int>(at - des); };  // less terminator
   while (!walk(Count{room()}, copyPrintable, at, src) && unit != 0) {
     int shift = 12;  // of the first digit
     while (shift > 0 && unit >> shift == 0) shift -= 4;
@@ -581,9 +581,9 @@ int StrLen(const char* str) noexcept { return length(units(str)); }
 int WStrLen(const WCHAR* str) noexcept { return length(units(str)); }
 int CharToLower(const int c) noexcept { return isLetterFrom('A', c) ? c + caseBit : c; }
 int CharToUpper(const int c) noexcept { return isLetterFrom('a', c) ? c - caseBit : c; }
-char* StrUpper(char* str) noexcept { return text(mapCase(units(str), 'a', -caseBit)); }
+char* StrUpper(char* str) noexcept { return api(mapCase(units(str), 'a', -caseBit)); }
 WCHAR* WStrUpper(WCHAR* str) noexcept { return mapCase(str, 'a', -caseBit); }
-char* StrLower(char* str) noexcept { return text(mapCase(units(str), 'A', caseBit)); }
+char* StrLower(char* str) noexcept { return api(mapCase(units(str), 'A', caseBit)); }
 WCHAR* WStrLower(WCHAR* str) noexcept { return mapCase(str, 'A', caseBit); }
 
 void StrCopy(char* dst, const char* src) noexcept { copy(units(dst), units(src)); }
@@ -602,25 +602,25 @@ void WStrNCatBuf(WCHAR* dst, int n, const WCHAR* src, int num) noexcept {
   catBuf(dst, n, src, num);
 }
 
-// Callers extend `c` to 32 bits by its sign or by zeros, as their own plain char is, and the
-// compiler expects this file's way. Hiding the value makes it reduce `c` to its low 8 bits.
+// A caller whose plain char is signed sign-extends `c` to 32 bits, another one zero-extends it, and
+// the compiler assumes this file's own way. Hiding the value makes it take the low 8 bits of `c`.
 char* StrChr(const char* str, const char c) noexcept {
   unsigned unit = static_cast<Byte>(c);
   STRUTIL_OPAQUE(unit);
-  return text(findUnit(units(str), static_cast<Byte>(unit)));
+  return api(findUnit(units(str), static_cast<Byte>(unit)));
 }
-WCHAR* WStrChr(const WCHAR* str, const WCHAR c) noexcept { return text(findUnit(str, c)); }
+WCHAR* WStrChr(const WCHAR* str, const WCHAR c) noexcept { return api(findUnit(str, c)); }
 char* StrStr(const char* str, const char* substr) noexcept {
-  return text(find(units(str), units(substr), exact));
+  return api(find(units(str), units(substr), exact));
 }
 WCHAR* WStrStr(const WCHAR* str, const WCHAR* substr) noexcept {
-  return text(find(str, substr, exact));
+  return api(find(str, substr, exact));
 }
 char* StrIStr(const char* str, const char* substr) noexcept {
-  return text(find(units(str), units(substr), anyCase));
+  return api(find(units(str), units(substr), anyCase));
 }
 WCHAR* WStrIStr(const WCHAR* str, const WCHAR* substr) noexcept {
-  return text(find(str, substr, anyCase));
+  return api(find(str, substr, anyCase));
 }
 
 int StrCmp(const char* str1, const char* str2) noexcept {
@@ -645,7 +645,7 @@ int WStrNICmp(const WCHAR* str1, const WCHAR* str2, int n) noexcept {
 }
 
 char* StrToken(char* str, int* off, const char* dlmt) noexcept {
-  return text(token(units(str), off, units(dlmt)));
+  return api(token(units(str), off, units(dlmt)));
 }
 WCHAR* WStrToken(WCHAR* str, int* off, const WCHAR* dlmt) noexcept { return token(str, off, dlmt); }
 int StrSplit(char* str, const char* dlmt, char** wrd) noexcept { return split(str, dlmt, wrd); }
@@ -662,7 +662,7 @@ int WStrReplace(const WCHAR* orig, const WCHAR* rep, const WCHAR* with, WCHAR* r
 }
 
 char* IntToStr(int value, char* string, int radix) noexcept {
-  return text(fromInt(value, units(string), radix));
+  return api(fromInt(value, units(string), radix));
 }
 WCHAR* IntToWStr(int value, WCHAR* string, int radix) noexcept {
   return fromInt(value, string, radix);
@@ -679,7 +679,7 @@ WCHAR* StrToWStr(const char* src, WCHAR* des, int bufsize) noexcept {
   return des;
 }
 char* WStrToStr(const WCHAR* src, char* des, int bufsize) noexcept {
-  return des ? text(toPrintable(src, units(des), bufsize)) : const_cast<char*>(emptyText);
+  return des ? api(toPrintable(src, units(des), bufsize)) : const_cast<char*>(emptyText);
 }
 void WStrToWords(const WCHAR* src, WORD* des, int len) noexcept { copyWords(des, src, len); }
 
