@@ -313,7 +313,6 @@ def replace(name, text, *parts):
 
 def main():
     images, source, fits = Path(sys.argv[1]), Path(sys.argv[2]), sys.argv[3:] == ["--fit"]
-    sys.path.append(str(source / "docs"))
     from api import functions
     symbols = functions(source)
     texts = {name: Path(source, name).read_text() for name in (PAGE, CHART, README)}

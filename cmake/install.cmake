@@ -10,24 +10,14 @@ install(DIRECTORY include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/strutil)
 install(EXPORT strutil NAMESPACE strutil:: DESTINATION ${package} FILE strutil-targets.cmake)
 install(FILES cmake/strutil-config.cmake DESTINATION ${package})
 
-# What the compiler says of the processor, a project's compiler has to say as well, or more; and the
-# same of the float ABI. The version file asks it. If that says ARM code before ARMv6, the processor is
-# among the flags of a target: such a project may have ARMv6-M's code, which runs on every Cortex-M.
+# The version file accepts a project whose compiler defines the processor's macros with values no less than
+# here, and the same float ABI. Preprocessing gives the values of here; the names in quotes stay. A compiler
+# that says Arm state before ARMv6 was not given a processor yet: maybe a target gives it. Code for ARMv6-M is
+# accepted there, because every Cortex-M runs it.
 separate_arguments(flags UNIX_COMMAND "${CMAKE_CXX_FLAGS}")
-execute_process(COMMAND ${CMAKE_CXX_COMPILER} ${flags} -E -dM -x c++ /dev/null
-  OUTPUT_VARIABLE macros ERROR_QUIET)
-string(REGEX MATCHALL "__(arm__|aarch64__|x86_64__|i386__|riscv|ARM_ARCH|ARM_ARCH_ISA_THUMB\
-|ARM_FEATURE_DSP|ARM_FEATURE_IDIV|ARM_FEATURE_MVE|ARM_PCS_VFP) [0-9]+" macros "${macros}")
-list(JOIN macros ", " built_for)
-list(JOIN macros " && " fits)
-string(REPLACE " " " >= " fits "${fits}")
-string(REPLACE " >= && >= " " && " fits "${fits}")
-if(NOT built_for MATCHES "PCS_VFP")
-  string(APPEND fits " && !__ARM_PCS_VFP")
-endif()
-if(built_for MATCHES "__ARM_ARCH 6")
-  string(APPEND fits " || (__arm__ && !__thumb__ && __ARM_ARCH < 6)")
-endif()
+execute_process(COMMAND ${CMAKE_CXX_COMPILER} ${flags} -E -P -x c++ ${PROJECT_SOURCE_DIR}/cmake/processor.in
+  OUTPUT_VARIABLE fits)
+string(REGEX REPLACE "[\"\n]" " " fits "${fits}")
 write_basic_package_version_file(${PROJECT_BINARY_DIR}/version.cmake
   VERSION ${PROJECT_VERSION} COMPATIBILITY SameMajorVersion)
 file(READ ${PROJECT_BINARY_DIR}/version.cmake version)

@@ -6,11 +6,11 @@
 
 namespace {
 
-constexpr int lineSize = 64;  // capacities, in units
+constexpr int lineSize = 64;  // capacities in bytes, terminators included
 constexpr int nameSize = 8;
 constexpr int valueSize = 16;
 
-enum Key { ctrlD = 4, bell = 7, backspace = 8, escape = 27, erase = 127 };
+enum Key { ctrlD = 4, bell = 7, backspace = 8, erase = 127 };
 
 struct Setting {
   char name[nameSize];
@@ -27,7 +27,7 @@ Setting* findSetting(const char* name) {
   return nullptr;
 }
 
-// Cuts the first word off `text` and returns it; `text` moves on to what follows it.
+// Splits the first word off `text` and returns it; `text` moves on to what follows it.
 char* firstWord(char*& text) {
   int off = 0;
   char* const word = StrToken(text, &off, " ");
@@ -45,10 +45,9 @@ void find(char* text) {
   const char* const exact = StrStr(text, needle);
   const char* const found = exact ? exact : StrIStr(text, needle);
   if (found) {
-    printf("%sat %d: %s\n", exact ? "" : "in other letters ", static_cast<int>(found - text),
-           found);
+    printf("at %d%s: %s\n", static_cast<int>(found - text), exact ? "" : " (ignoring case)", found);
   } else {
-    printf("\"%s\" is not found\n", needle);
+    printf("not found: \"%s\"\n", needle);
   }
 }
 
@@ -65,14 +64,14 @@ void set(char* text) {
   char* const name = StrToken(text, &off, "=");
   char* const value = text + off;
   if (!name || StrTrim(name, " ") == 0 || StrTrim(value, " ") == 0) {
-    printf("set NAME = VALUE, please\n");
+    printf("usage: set NAME = VALUE\n");
     return;
   }
   Setting* setting = findSetting(name);
   if (StrLen(name) >= nameSize || StrLen(value) >= valueSize) {
-    printf("too long: a name has at most %d units, a value %d\n", nameSize - 1, valueSize - 1);
+    printf("too long: NAME has at most %d bytes, VALUE %d\n", nameSize - 1, valueSize - 1);
   } else if (!setting && settingCount == sizeof settings / sizeof *settings) {
-    printf("all %d settings are in use\n", settingCount);
+    printf("no room: all %d settings are in use\n", settingCount);
   } else {
     if (!setting) {
       setting = &settings[settingCount++];
@@ -89,11 +88,11 @@ void append(char* text) {
     const int wanted = StrLen(setting->value) + StrLen(text);
     StrCatBuf(setting->value, valueSize, text);
     printf("%s = %s", setting->name, setting->value);
-    const int cut = wanted - StrLen(setting->value);
-    if (cut > 0) printf(" (%d units cut: a value has at most %d)", cut, valueSize - 1);
+    const int lost = wanted - StrLen(setting->value);
+    if (lost > 0) printf(" (truncated by %d bytes: VALUE has at most %d)", lost, valueSize - 1);
     printf("\n");
   } else {
-    printf("\"%s\" is not set\n", name);
+    printf("not set: \"%s\"\n", name);
   }
 }
 
@@ -107,7 +106,7 @@ void fill(char* text) {
     const char* const from = filled[i % 2];
     const int size = StrReplace(from, pattern, settings[i].value, nullptr) + 1;
     if (size > lineSize) {
-      printf("does not fit: %d of %d units\n", size, lineSize);
+      printf("too long: %d bytes (max %d)\n", size - 1, lineSize - 1);
       return;
     }
     StrReplace(from, pattern, settings[i].value, filled[(i + 1) % 2]);
@@ -129,16 +128,16 @@ void number(char* text) {
   int radix = 10;
   char digits[34];
   if (!readNumber(firstWord(text), value) || (*text != 0 && !readNumber(text, radix))) {
-    printf("a number has 1 to 9 digits\n");
+    printf("a number must have 1 to 9 digits\n");
   } else if (radix < 2 || radix > 36) {
-    printf("a radix is 2 to 36\n");
+    printf("the radix must be 2 to 36\n");
   } else {
     printf("%s\n", IntToStr(value, digits, radix));
   }
 }
 
 void label(char* text) {
-  WCHAR wide[lineSize] = {0x2192, ' ', 0};  // an arrow, which no narrow text has
+  WCHAR wide[lineSize] = {0x2192, ' ', 0};  // an arrow, which no narrow string has
   WCHAR units[lineSize];
   WStrCatBuf(wide, lineSize, StrToWStr(text, units, lineSize));
   char shown[lineSize * 9];  // no unit takes more than 9
@@ -181,43 +180,32 @@ bool answer(char* line) {
     if (!name || StrICmp(command.name, name) != 0) continue;
     if (!command.run) return false;
     if (*line == 0 && *command.arguments != 0) {
-      printf("an argument is missing: %s %s\n", command.name, command.arguments);
+      printf("usage: %s %s\n", command.name, command.arguments);
     } else {
       command.run(line);
     }
     return true;
   }
-  printf("there is no command \"%s\"; try help\n", name ? name : "");
+  printf("unknown command: \"%s\" (try help)\n", name ? name : "");
   return true;
 }
 
-// Reads a line as it is typed, shows it, and returns its length; -1 where the input ends. Of a line
-// that is too long, `line` holds, and the other side sees, only what fits; the rest rings the bell.
+// Reads a line as it is typed, echoes it, and returns its length; -1 at the end of the input. Of a
+// line that is too long, only what fits is stored and echoed; each further byte rings the bell.
 int readLine(char* line) {
   static bool afterReturn = false;
   int length = 0;
-  bool inSequence = false;  // of an arrow key, say
-  for (int c = 0;;) {
-    const int before = c;
-    c = getchar();
+  for (;;) {
+    const int c = getchar();
     const bool endsReturn = c == '\n' && afterReturn;
     afterReturn = c == '\r';
     if (endsReturn) continue;
     if (length == 0 && (c == EOF || c == ctrlD)) return -1;
     if (c == EOF || c == ctrlD || c == '\r' || c == '\n') break;
-    if (inSequence || (c == '[' && before == escape)) {
-      inSequence = c == '[' || c < '@';
-    } else if (c == backspace || c == erase) {
+    if (c == backspace || c == erase) {
       if (length == 0) continue;
-      if (--length >= lineSize - 1) continue;
-      if ((line[length] & 0x80) == 0) {
-        printf("\b \b");
-      } else {
-        // The bytes of one character that follow its first are 128 to 191. It may be wide, so the
-        // line is shown again.
-        while (length > 0 && (line[length] & 0xC0) == 0x80) --length;
-        printf("\033[G> %.*s\033[K", length, line);
-      }
+      --length;
+      if (length < lineSize - 1) printf("\b \b");
     } else if (c >= ' ' || c == '\t') {
       if (length < lineSize - 1) {
         line[length] = static_cast<char>(c == '\t' ? ' ' : c);
@@ -242,7 +230,7 @@ int main() {
     printf("> ");
     const int length = readLine(line);
     if (length >= lineSize) {
-      printf("%d units are too many: a line has at most %d\n", length, lineSize - 1);
+      printf("line too long: %d bytes (max %d)\n", length, lineSize - 1);
     } else {
       if (length < 0) printf("\n");
       running = length >= 0 && answer(line);

@@ -78,7 +78,7 @@ FILE* const stdout = &port;
 FILE* const stderr = &port;
 
 extern "C" [[noreturn]] void _exit(int) {
-  at(SCB_AIRCR) = 0x05FA0004;  // a reset, please
+  at(SCB_AIRCR) = 0x05FA0004;  // requests a reset
   for (;;) {
   }
 }
