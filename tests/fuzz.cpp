@@ -7,7 +7,7 @@
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
   static doctest::Context context;
   context.setAsDefaultForAssertsOutOfTestCases();
-  tell = [](const char*, int, const std::string& failure) {
+  report = [](const char*, int, const std::string& failure) {
     std::fprintf(stderr, "%s\n", failure.c_str());
     std::abort();
   };
@@ -19,15 +19,15 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* bytes, size_t size) {
   const auto choose = [&data](size_t n) {
     return data.ConsumeIntegralInRange<unsigned>(0, static_cast<unsigned>(n) - 1);
   };
+  unsigned count = 0;
+  forEachFunction([&count](const auto&) { ++count; });
   while (data.remaining_bytes() > 0) {
-    unsigned count = 0;
-    withEach<WCHAR>([&count](const auto&) { ++count; });
     const unsigned chosen = choose(count);
+    const unsigned seed = choose(65536);
     unsigned i = 0;
-    const auto checkChosen = [&](const auto& function) {
-      if (i++ == chosen) checkByChance(function, choose);
-    };
-    choose(2) > 0 ? withEach<char>(checkChosen) : withEach<WCHAR>(checkChosen);
+    forEachFunction([&](const auto& function) {
+      if (i++ == chosen) checkRandomCall(function, choose, seed);
+    });
   }
   return 0;
 }
