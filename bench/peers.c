@@ -1,5 +1,5 @@
 /* What a C library has no single function for, put together from those that it has. */
-#define _GNU_SOURCE  /* for strcasestr. NOLINT: the name is the C libraries' */
+#define _GNU_SOURCE /* for strcasestr. NOLINT: the name is the C libraries' */
 #include <stdlib.h>
 #include <string.h>
 
