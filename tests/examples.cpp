@@ -8,7 +8,8 @@ namespace {
 static_assert(std::is_same_v<INT8, int8_t> && std::is_same_v<WCHAR, uint16_t> &&
               std::is_same_v<WORD, uint16_t>);
 
-// A call and its outcome. The first string of a function that writes to a buffer is u"".
+// A call and its outcome. The first string of a function that writes to a buffer is u"". In
+// functions of one width, units from 128 on stand for those of toUnitsOf().
 struct Example {
   const char* name;
   std::vector<Units> strings;
@@ -19,7 +20,11 @@ struct Example {
 template <typename To, typename From>
 void checkExamples(const std::vector<Function<To, From>>& table,
                    const std::vector<Example>& examples) {
-  for (const Example& one : examples) {
+  for (Example one : examples) {
+    if (std::is_same_v<To, From>) {
+      for (Units& units : one.strings) units = toUnitsOf<To>(units);
+      one.outcome.written = toUnitsOf<To>(one.outcome.written);
+    }
     for (unsigned seed = 0; seed < 16; ++seed) {
       check(find(table, one.name), {one.strings, one.numbers}, seed, &one.outcome);
     }
@@ -37,6 +42,12 @@ TEST_CASE("CharToLower, CharToUpper: the 26 letters and nothing else") {
   for (int c = -300; c < (isBoard ? 300 : 70000); ++c) {
     for (const auto& function : ofInts) check(function, {{u""}, {c}}, 0);
   }
+  for (int c = 'A'; c <= 'z'; ++c) {
+    for (unsigned bit = 7; bit < 32; ++bit) {
+      for (const auto& function : ofInts)
+        check(function, {{u""}, {c ^ static_cast<int>(1U << bit)}}, 0);
+    }
+  }
 }
 
 TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf, StrNCopy: examples", Unit, char, WCHAR) {
@@ -51,16 +62,21 @@ TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf, StrNCopy: examples", Unit, char, WCHAR)
 
 TEST_CASE_TEMPLATE("StrCopy, StrCopyBuf, StrNCopy: dst begins before src and overlaps it", Unit,
                    char, WCHAR) {
-  const Units string = toUnitsOf<Unit>(longString(21)) + u'\0';
+  const Units string = longString<Unit>(21) + u'\0';
   for (size_t distance = 1; distance < 12; ++distance) {
-    for (int form = 0; form < 3; ++form) {
-      Memory<Unit> memory(Units(distance, u'-') + string, string.size() + distance, 0, 0);
-      Unit* const dst = memory.get();
-      if (form == 0) twin<Unit>(StrCopy, WStrCopy)(dst, dst + distance);
-      if (form == 1) twin<Unit>(StrCopyBuf, WStrCopyBuf)(dst, 30, dst + distance);
-      if (form == 2) twin<Unit>(StrNCopy, WStrNCopy)(dst, dst + distance, 30);
-      CAPTURE(form);
-      CHECK_MESSAGE(memory.holds(string), "by ", distance, ": ", memory.shown());
+    for (const int n : {30, 15}) {
+      for (int form = 0; form < 3; ++form) {
+        Memory<Unit> memory(Units(distance, u'-') + string, string.size() + distance, 0, 0);
+        Unit* const dst = memory.get();
+        Units expected = string;
+        if (form == 0) twin<Unit>(StrCopy, WStrCopy)(dst, dst + distance);
+        if (form == 1) twin<Unit>(StrCopyBuf, WStrCopyBuf)(dst, n, dst + distance);
+        if (form == 2) twin<Unit>(StrNCopy, WStrNCopy)(dst, dst + distance, n);
+        if (form == 1 && n == 15) expected = string.substr(0, 14) + u'\0';
+        if (form == 2 && n == 15) expected = string.substr(0, 15);
+        CAPTURE(form);
+        CHECK_MESSAGE(memory.holds(expected), "by ", distance, ": ", memory.shown());
+      }
     }
   }
 }
@@ -116,9 +132,11 @@ TEST_CASE_TEMPLATE("StrToken, StrSplit, StrTrim: examples", Unit, char, WCHAR) {
        {"StrTrim", {u"--ab-.", u"-."}, {}, gives(2).writes(u"ab\0b\0.\0"s)},
        {"StrTrim", {u"--", u"-"}, {}, gives(0).writes(u"\0-\0"s)},
        {"StrTrim", {u"a-b", null}, {}, gives(3).writesString(u"a-b")}});
-  Unit text[] = {'a', ',', 'b', 0};
-  CHECK(twin<Unit>(StrToken, WStrToken)(text, nullptr, text + 1) == nullptr);
-  CHECK(twin<Unit>(StrSplit, WStrSplit)(text, text + 2, nullptr) == 0);
+  Memory<Unit> memory(u"a,b\0,"s, 6, 0, 0);
+  Unit* const text = memory.get();
+  CHECK(twin<Unit>(StrToken, WStrToken)(text, nullptr, text + 4) == nullptr);
+  CHECK(twin<Unit>(StrSplit, WStrSplit)(text, text + 4, nullptr) == 0);
+  CHECK(memory.holds(u""));
 }
 
 TEST_CASE_TEMPLATE("StrReplace: examples", Unit, char, WCHAR) {
@@ -145,7 +163,7 @@ TEST_CASE_TEMPLATE("IntToStr, StrToInt: examples", Unit, char, WCHAR) {
 
 TEST_CASE("BytesToWords, StrToWStr, WStrToStr, WStrToWords: examples") {
   checkExamples(widening,
-                {{"BytesToWords", {u"", u"a\0\u00ff"s}, {3}, writes(u"a\0\u00ff"s)},
+                {{"BytesToWords", {u"", u"a\0\u00ff\0"s}, {4}, writes(u"a\0\u00ff\0"s)},
                  {"StrToWStr", {u"", u"\u00e9\u00ff"}, {5}, gives(0).writesString(u"\u00e9\u00ff")},
                  {"StrToWStr", {u"", u"abc"}, {0}, gives(0).writesString(u"")}});
   checkExamples(narrowing,
@@ -153,7 +171,7 @@ TEST_CASE("BytesToWords, StrToWStr, WStrToStr, WStrToWords: examples") {
                  {"WStrToStr", {u"", u"\n"}, {6}, gives(0).writesString(u"")},
                  {"WStrToStr", {u"", u"a\u4e2db"}, {10}, gives(0).writesString(u"a")},
                  {"WStrToStr", {u"", u"\u4e2d"}, {10}, gives(0).writesString(u"&(0x4e2d)")}});
-  checkExamples(wideOnly, {{"WStrToWords", {u"", u"a\u4e2db"}, {2}, writes(u"a\u4e2d")}});
+  checkExamples(wideOnly, {{"WStrToWords", {u"", u"a\0\u4e2d\0b"s}, {4}, writes(u"a\0\u4e2d\0"s)}});
 }
 
 TEST_CASE("BytesToWords, WStrToWords: overlapping arrays are copied forward") {
@@ -182,20 +200,20 @@ TEST_CASE("BytesToWords, WStrToWords: overlapping arrays are copied forward") {
 
 TEST_CASE_TEMPLATE("Nothing is written where nothing changes", Unit, char, WCHAR) {
   // Where constant data is protected, a write to it is a fault.
-  static const Unit uppercase[] = {'A', '1', 'Z', '{', '_', 0};
-  static const Unit lowercase[] = {'a', '1', 'z', '{', '_', 0};
+  static const Unit uppercase[] = {'A', '1', 'Z', '{', '_', static_cast<Unit>(0xe1), 0};
+  static const Unit lowercase[] = {'a', '1', 'z', '@', '[', static_cast<Unit>(0xc1), 0};
   Unit* const text = const_cast<Unit*>(lowercase);
   CHECK(twin<Unit>(StrUpper, WStrUpper)(const_cast<Unit*>(uppercase)) == uppercase);
   CHECK(twin<Unit>(StrLower, WStrLower)(text) == lowercase);
   twin<Unit>(StrCopy, WStrCopy)(text, text);
   twin<Unit>(StrCopyBuf, WStrCopyBuf)(text, 0, uppercase);
-  for (const int n : {INT_MIN, 0, 1, 3, 6}) {
+  for (const int n : {INT_MIN, 0, 1, 3, 6, 7}) {
     twin<Unit>(StrCopyBuf, WStrCopyBuf)(text, n, text);
     twin<Unit>(StrNCopy, WStrNCopy)(text, text, n);
     twin<Unit>(StrCatBuf, WStrCatBuf)(text, n, uppercase);
     if constexpr (isWide<Unit>) WStrNCatBuf(text, n, uppercase, 9);
   }
-  CHECK(twin<Unit>(StrReplace, WStrReplace)(text, uppercase, uppercase, text) == 5);
+  CHECK(twin<Unit>(StrReplace, WStrReplace)(text, uppercase, uppercase, text) == 6);
 }
 
 }  // namespace

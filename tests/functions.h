@@ -63,9 +63,9 @@ struct Layout {
     sharesEqual = random(2) > 0;
     endsAtBound = random(2) > 0;
   }
-  std::string shown() const {
+  std::string shown(size_t strings) const {
     std::string shown = " (offsets";
-    for (const unsigned one : offsets) shown += ' ' + std::to_string(one);
+    for (size_t i = 0; i < strings; ++i) shown += ' ' + std::to_string(offsets[i]);
     shown += sharesEqual ? ", equal strings shared" : ", equal strings apart";
     return shown + (endsAtBound ? ", ending at the bound)" : ", terminated)");
   }
@@ -92,16 +92,12 @@ inline Units unitsInMemory(const Units& string, int reads, const Layout& layout)
 // Makes a call in the memory layout of the seed, and compares its outcome with the one given, or
 // else with the contract's. Of each function the first three failures are reported.
 template <typename To, typename From>
-void check(const Function<To, From>& function, Args args, unsigned seed,
+void check(const Function<To, From>& function, const Args& args, unsigned seed,
            const Outcome* given = nullptr, const char* file = __builtin_FILE(),
            int line = __builtin_LINE()) {
   constexpr bool isOneWidth = std::is_same_v<To, From>;
-  std::vector<Units>& strings = args.strings;
-  if (isOneWidth) {
-    for (Units& one : strings) one = toUnitsOf<To>(one);
-  }
-  Outcome expected = given ? *given : function.contract(args);
-  if (isOneWidth && given) expected.written = toUnitsOf<To>(expected.written);
+  const std::vector<Units>& strings = args.strings;
+  const Outcome expected = given ? *given : function.contract(args);
   const Layout layout(seed);
   const bool readsFirst = function.roles[0] != buffer;
   const bool onlyReads = readsFirst && expected.written.empty();
@@ -141,7 +137,7 @@ void check(const Function<To, From>& function, Args args, unsigned seed,
   for (const int one : args.numbers) arguments += ", " + std::to_string(one);
   report(file, line,
          function.fullName() + '(' + arguments + "):" + failure + " seed " + std::to_string(seed) +
-             layout.shown());
+             layout.shown(strings.size()));
 }
 
 // Calls from an offset on to the second null.
@@ -362,8 +358,8 @@ Units randomString(Choose& choose, const Units& other) {
                                                    : choose(1100);
   const Units alphabets[] = {u"a\u00e1", u"aA_\u00e1[{\u00c1\u00d1", u"a,;\u00ac -",
                              u" \t-0\u00b19x\u0080"};
-  const Units& alphabet = alphabets[choose(4)];
-  Units string = length > 8 && choose(2) > 0 ? longString(length) : u"";
+  const Units alphabet = toUnitsOf<Unit>(alphabets[choose(4)]);
+  Units string = length > 8 && choose(2) > 0 ? longString<Unit>(length) : u"";
   while (string.size() < length) string += alphabet[choose(alphabet.size())];
   switch (other == null ? 7 : choose(8)) {
     case 0: return other;

@@ -126,11 +126,12 @@ class Memory {
 
 // n units of all kinds except separators, in an order that does not repeat. The wide ones include
 // surrogate pairs.
-inline Units longString(size_t n) {
+template <typename Unit>
+Units longString(size_t n) {
   Units string;
   for (unsigned state = 1; string.size() < n; state = state * 75 % 65537) {
     string += u"aZ_\u00e1mA{zM@\u0080\u00c1"[state % 12];
     if (string.back() == u'\u00c1') string += u'\u00d1';
   }
-  return string.substr(0, n);
+  return toUnitsOf<Unit>(string.substr(0, n));
 }
