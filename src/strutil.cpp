@@ -33,7 +33,7 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 #elif defined(__GNUC__)
 #pragma GCC push_options
 #if STRUTIL_FAST
-#pragma GCC optimize("O2", "inline")
+#pragma GCC optimize("O2", "inline", "no-ipa-sra")  // sra: GCC 14 makes other code at -Og
 #else
 #pragma GCC optimize("Os", "inline")  // without "inline", -O0 would inline nothing
 #endif
