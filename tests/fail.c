@@ -1,4 +1,4 @@
-/* A program that fails, which must be seen. */
+/* A test program that fails: its exit status must reach the host. */
 #include <stdio.h>
 
 int main(void) {
