@@ -44,6 +44,7 @@ inline Units firstOf(const Units& string, int count) {
 }
 
 inline Units translate(Units string, const Units& from, const Units& to) {
+  if (string == null) return null;
   for (char16_t& unit : string) {
     const size_t letter = from.find(unit);
     if (letter != Units::npos) unit = to[letter];
@@ -52,14 +53,23 @@ inline Units translate(Units string, const Units& from, const Units& to) {
 }
 inline const Units uppercase = u"ABCDEFGHIJKLMNOPQRSTUVWXYZ";
 inline const Units lowercase = u"abcdefghijklmnopqrstuvwxyz";
-inline Units toLower(const Units& string) {
-  return string == null ? null : translate(string, uppercase, lowercase);
+inline Units toLower(const Units& string) { return translate(string, uppercase, lowercase); }
+inline Units toUpper(const Units& string) { return translate(string, lowercase, uppercase); }
+
+inline Outcome charToLower(const Args& args) {
+  const int c = args.numbers[0];
+  return gives(c >= 'A' && c <= 'Z' ? c + 32 : c);
 }
-inline Units toUpper(const Units& string) {
-  return string == null ? null : translate(string, lowercase, uppercase);
+inline Outcome charToUpper(const Args& args) {
+  const int c = args.numbers[0];
+  return gives(c >= 'a' && c <= 'z' ? c - 32 : c);
 }
-inline int charToLower(int c) { return c >= 'A' && c <= 'Z' ? c + 32 : c; }
-inline int charToUpper(int c) { return c >= 'a' && c <= 'z' ? c - 32 : c; }
+
+// With the strings in lowercase.
+inline Args lowered(Args args) {
+  for (Units& string : args.strings) string = toLower(string);
+  return args;
+}
 
 // The first string becomes `string`, and a pointer to it is returned.
 inline Outcome makes(const Args& args, const Units& string) {
@@ -86,20 +96,22 @@ inline Outcome append(const Args& args, int n, int num) {
   return writesString(args.strings[0] + firstOf(args.strings[1], count)).readsAtMost(count);
 }
 
-inline Outcome find(const Units& str, const Units& substr) {
-  if (str == null || substr == null || str.empty()) return gives(-1);
-  return gives(static_cast<int>(str.find(substr)));  // npos becomes -1
+inline Outcome find(const Args& args) {
+  if (anyNull(args) || args.strings[0].empty()) return gives(-1);
+  return gives(static_cast<int>(args.strings[0].find(args.strings[1])));  // npos becomes -1
 }
 
 // The unit to look for is the first of the second string, which may be its terminator.
 inline Outcome findUnit(const Args& args) {
-  if (args.strings[1].empty()) return gives(-1);
-  return args.strings[1] == null ? gives(-1) : find(args.strings[0], firstOf(args.strings[1], 1));
+  if (anyNull(args) || args.strings[1].empty()) return gives(-1);
+  return find({{args.strings[0], firstOf(args.strings[1], 1)}, {}});
 }
 
 enum class Order { regular, irregular };  // irregular: every difference is negative
 
-inline Outcome compare(const Units& str1, const Units& str2, int n, Order order = Order::regular) {
+inline Outcome compare(const Args& args, int n, Order order = Order::regular) {
+  const Units& str1 = args.strings[0];
+  const Units& str2 = args.strings[1];
   if (str1 == null || str2 == null) return gives((str2 == null) - (str1 == null));
   const Units a = firstOf(str1 + u'\0', n);
   const Units b = firstOf(str2 + u'\0', n);
@@ -171,7 +183,7 @@ inline Outcome replace(const Args& args) {
   return args.strings[0] == null ? sized : sized.writesString(string);
 }
 
-inline Units intToString(int value, int radix) {
+inline Units digits(int value, int radix) {
   if (radix < 1) return u"";
   if (radix == 1) return value == 0 ? u"0" : u"";
   Units string;
@@ -183,16 +195,21 @@ inline Units intToString(int value, int radix) {
   return value < 0 ? u'-' + string : string;
 }
 
-inline int stringToInt(const Units& string) {
+inline Outcome intToStr(const Args& args) {
+  return makes(args, digits(args.numbers[0], args.numbers[1]));
+}
+
+inline Outcome strToInt(const Args& args) {
+  const Units& string = args.strings[0];
   size_t at = string == null ? Units::npos : string.find_first_not_of(u" \t");
-  if (at == Units::npos) return 0;
+  if (at == Units::npos) return gives(0);
   const bool isNegative = string[at] == u'-';
   unsigned long long value = 0;
   for (at += isNegative ? 1 : 0; at < string.size(); ++at) {
     if (string[at] < u'0' || string[at] > u'9') break;
     value = (value * 10 + (string[at] - u'0')) % (1ULL << 32);
   }
-  return static_cast<int>(static_cast<unsigned>(isNegative ? -value : value));
+  return gives(static_cast<int>(static_cast<unsigned>(isNegative ? -value : value)));
 }
 
 inline Outcome copyElements(const Args& args) {
@@ -206,15 +223,15 @@ inline Outcome widen(const Args& args) {
   return outcome;
 }
 
-inline Units escape(const Units& src, int bufsize) {
+inline Outcome escape(const Args& args) {
   Units string;
-  for (const char16_t unit : src == null ? u"" : src) {
+  for (const char16_t unit : args.strings[1] == null ? u"" : args.strings[1]) {
     const bool isPrintable = unit >= u' ' && unit <= u'~';
-    const Units piece = isPrintable ? Units(1, unit) : u"&(0x" + intToString(unit, 16) + u")";
-    if (length(string) + length(piece) >= bufsize) break;
+    const Units piece = isPrintable ? Units(1, unit) : u"&(0x" + digits(unit, 16) + u")";
+    if (length(string) + length(piece) >= args.numbers[0]) break;
     string += piece;
   }
-  return string;
+  return makes(args, string);
 }
 
 }  // namespace contract

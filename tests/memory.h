@@ -88,9 +88,10 @@ class Random {
 template <typename Unit>
 class Memory {
  public:
-  // `size` units, of which the first hold `content`. The others are like the guard units.
+  // `size` units, of which the first hold `content`, after as many guard units as `offset` says,
+  // which must be 1 or more. The other units are like the guard units.
   Memory(const Units& content, size_t size, unsigned offset, unsigned filler)
-      : start(1 + offset), units(start + size + guard) {
+      : start(offset), units(start + size + guard) {
     constexpr Unit fillers[] = {'a', 'A', ',', ' ', '7', 0};
     for (size_t i = 0; i < units.size(); ++i) units[i] = fillers[(filler + i) / 2 % 6];
     std::copy(content.begin(), content.end(), units.data() + start);
