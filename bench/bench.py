@@ -186,7 +186,7 @@ def check_cost(build, function, cost, cycles, bytes, stack):
         arguments, lengths = function.calls[number]
         slack.append(cost.of(lengths) - found)
         if slack[-1] < 0:
-            sys.exit(f"{build}: {title} takes {found} cycles with {shown(arguments)}, more than "
+            sys.exit(f"{build}: {title} takes {found} cycles with {shown(arguments)}, and its upper bound is "
                      f"{cost.formula()} = {cost.of(lengths):g}. {WHAT_TO_DO}")
     if min(slack) >= 1:
         sys.exit(f"{build}: {title}: no call comes near its bound, {cost.formula()}. {WHAT_TO_DO}")
@@ -209,7 +209,7 @@ def check_build(images, build, stated, is_compared):
         title = function.title(function.name)
         try:
             cycles, stack, parts = costs.search(core, function, function.names(), stated[OURS, title].worst)
-        except (Stopped, IndexError) as error:
+        except Stopped as error:
             sys.exit(f"{build}: {title}: {error}")
         sizes = [sum(one.values()) for one in parts]
         for one in parts:
@@ -223,6 +223,12 @@ def check_build(images, build, stated, is_compared):
         if is_compared and build in costs.BUILDS:
             check_cost(build, function, stated[build, title], cycles, max(sizes), max(stack.values()))
     return Build(sum(everything.values()), mean(alone), deepest)
+
+
+def check_complete():
+    missing = set(costs.SYMBOLS) - {name for function in FUNCTIONS for name in function.names()}
+    if missing:
+        sys.exit(f"bench/calls.py has no entry for {', '.join(sorted(missing))}")
 
 
 def versions_of(images):
@@ -249,6 +255,7 @@ def fit_all(images):
 
 def main():
     images, source, fits = Path(sys.argv[1]), Path(sys.argv[2]), sys.argv[3:] == ["--fit"]
+    check_complete()
     check_counter(images)
     versions = versions_of(images)
     if fits:
@@ -276,5 +283,5 @@ def main():
 if __name__ == "__main__":
     try:
         main()
-    except BadImage as error:
+    except (BadImage, OSError) as error:
         sys.exit(error)

@@ -133,10 +133,11 @@ def load():
         next(file)
         lines = {line["function"]: line for line in csv.DictReader(file)}
     for function in FUNCTIONS:
-        line = lines.get(function.title(function.name))
-        if line is None:
-            sys.exit(f"{FILE}: no line for {function.title(function.name)}: run ./dev bench")
+        title = function.title(function.name)
+        line = lines.get(title, {"worst calls": ""})
         worst = [int(number) for number in line["worst calls"].split()]
+        if not worst or max(worst) >= len(function.calls):
+            sys.exit(f"{FILE} does not fit bench/calls.py: {title} has no worst calls. Run ./dev bench.")
         for build in BUILDS:
             factors = dict(zip(function.terms, map(float, line[f"{build} bound"].split())))
             cost = Cost(factors, int(line[f"{build} bytes"]), int(line[f"{build} stack"]), worst)
