@@ -1,5 +1,5 @@
-"""The library's functions: the calls that may be the worst of their lengths, and those that a C library or
-a naive loop can make as well. Each function has an entry in FUNCTIONS, at the end."""
+"""The library's functions: the calls that may be the worst of their lengths, and those that a C
+library or a naive loop can make as well. Each function has an entry in FUNCTIONS, at the end."""
 from dataclasses import dataclass
 from itertools import product
 from typing import Callable, NamedTuple
@@ -9,15 +9,16 @@ from core import Buffer, Same, Words
 INT_MAX = 0x7FFFFFFF
 OUT = Buffer(None)  # as large as need be
 
-# Up to three units every string of some classes of unit is tried. Then come lengths around the iterations
-# of a loop that is unrolled four times, and one so long that only the cost per unit counts.
+# Up to three units every string of some classes of unit is tried. Then come lengths around the
+# iterations of a loop that is unrolled four times, and one so long that only the cost per unit
+# counts.
 SHORT = range(4)
 LONG = 5, 8, 16, 17, 18, 19, 34, 35, 64, 65, 66, 67, 131
 VERY_LONG = 515
 
 
-# Candidates for the worst case. Each generator gives pairs: the arguments of a call, and the lengths that
-# its upper bound depends on.
+# Candidates for the worst case. Each generator gives pairs: the arguments of a call, and the
+# lengths that its upper bound depends on.
 
 
 def alternate(one, other, length):
@@ -25,8 +26,8 @@ def alternate(one, other, length):
 
 
 def strings(*classes):
-    """All short strings of such units; long ones of one unit with another at the end, or of two that
-    alternate; very long ones that alternate."""
+    """All short strings of such units; long ones of one unit with another at the end, or of two
+    that alternate; very long ones that alternate."""
     for length in SHORT:
         for units in product(classes, repeat=length):
             yield "".join(units)
@@ -65,10 +66,12 @@ def copies(arguments, counts=counts_around):
 
 def appends(arguments, counts=counts_around):
     """By arguments(dst, src, count, capacity)."""
-    for d, length in product((0, 1, 2, 3, 16, 17, 64, 67, 515), (0, 1, 2, 3, 4, 5, 8, 16, 19, 64, 65, 67, 515)):
+    more = *SHORT, 4, 5, 8, 16, 19, 64, 65, 67, VERY_LONG
+    for d, length in product((*SHORT, 16, 17, 64, 67, VERY_LONG), more):
+        dst, src = Buffer(None, "a" * d), "b" * length
         for count in counts(length):
             capacity = min(d + count + 1, INT_MAX)
-            yield arguments(Buffer(None, "a" * d), "b" * length, count, capacity), {"d": d, "n": taken(length, count)}
+            yield arguments(dst, src, count, capacity), {"d": d, "n": taken(length, count)}
 
 
 def find_unit():
@@ -95,7 +98,8 @@ def find_string(fold=str):
 def compares(ignores_case=False, has_count=False):
     pairs = [(string, string) for string in strings("x")]
     if ignores_case:
-        pairs += [pair for string in strings("x") for pair in ((string, string.upper()), (string.upper(), string))]
+        pairs += [(string, string.upper()) for string in strings("x")]
+        pairs += [(string.upper(), string) for string in strings("x")]
     ends = ("", ""), ("1", "2"), ("@", "`"), ("x", ""), ("", "x"), ("A", "b"), ("b", "A")
     for (one, two), (end1, end2) in product(pairs, ends):
         if has_count:
@@ -125,11 +129,10 @@ def with_sets(arguments, end=lambda string, members: len(string)):
 
 
 def replaces(result):
-    texts = []
+    patterns = "a", "b", "aa", "ab", "aab", "aaab", "aaaaaaab", "abababab", "a" * 15 + "b"
+    texts = list(product(strings("a", "b"), patterns, (0, 1, 9)))
     for m, w in product(range(1, 18), (*range(6), *range(16, 20), 34, 35)):
         texts += [(orig, "a" * m, w) for orig in ("", "a", "a" * 67 if m == 1 else "aab")]
-    patterns = "a", "b", "aa", "ab", "aab", "aaab", "aaaaaaab", "abababab", "a" * 15 + "b"
-    texts += [(orig, rep, w) for rep, w in product(patterns, (0, 1, 9)) for orig in strings("a", "b")]
     for orig, rep, w in texts:
         r = len(orig.replace(rep, "y" * w))
         yield (orig, rep, "y" * w, result), {"n": len(orig), "m": len(rep), "w": w, "r": r}
@@ -187,15 +190,15 @@ def characters():
 
 # What others can do as well.
 
-PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the blinds "
-         "by 9. ") * 3
+PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the "
+         "blinds by 9. ") * 3
 DIGITS = "1234567890"
 SIZES, DIGIT_SIZES, ONE_SIZE = (4, 16, 64, 256), (1, 4, 10), (16,)
 
 
 class Case(NamedTuple):
-    """A call in several sizes: arguments(n, t) gives it for n units, and t are n units of prose. A call that
-    repeats is made until it returns null."""
+    """A call in several sizes: arguments(n, t) gives it for n units, and t are n units of prose.
+    One that repeats is made until it returns null."""
     about: str
     arguments: Callable
     sizes: tuple = SIZES
@@ -204,9 +207,10 @@ class Case(NamedTuple):
 
 @dataclass
 class Function:
-    """A function of the library, and its wide version if it has one. Where it has two upper bounds, `about`
-    tells them apart. A C library's `peer` takes the arguments in an `order` of its own. `widths` are the
-    bytes of a unit of the first argument and of the others, where the name does not say them."""
+    """A function of the library, and its wide version if it has one. Where it has two upper bounds,
+    `about` tells them apart. A C library's `peer` takes the arguments in an `order` of its own.
+    `widths` are the bytes of a unit of the first argument and of the others, where the name does
+    not say them."""
     name: str
     wide: str
     terms: list  # of the upper bound
@@ -215,7 +219,7 @@ class Function:
     peer: str = ""
     order: tuple = ()
     returns: str = "nothing"  # or "number"; "sign", if a C library promises no more; or "pointer"
-    nulls: tuple = (0, 1, 2, 3)  # the arguments that may be null, in a call of which all lengths are 0
+    nulls: tuple = (0, 1, 2, 3)  # arguments that may be null, in a call of which all lengths are 0
     about: str = ""
     widths: tuple = ()
 
@@ -235,14 +239,18 @@ class Function:
     def names(self):
         return [name for name in (self.name, self.wide) if name]
 
-    def title(self, name):
+    @property
+    def title(self):
+        return self.title_of(self.name)
+
+    def title_of(self, name):
         return f"{name}, {self.about}" if self.about else name
 
     def widths_of(self, name):
         return self.widths or ((2, 2) if name == self.wide or name.startswith("W") else (1, 1))
 
 
-N, SET = ["1", "n"], ["1", "n", "n m", "m"]
+N, APPEND, FIND, SET = ["1", "n"], ["1", "d", "n"], ["1", "n", "n m"], ["1", "n", "n m", "m"]
 FUNCTIONS = [
     Function("StrLen", "WStrLen", N, one_string("x"), [
         Case("", lambda n, t: (t,))], "strlen", returns="number"),
@@ -258,32 +266,35 @@ FUNCTIONS = [
         *copies(lambda src, _: (OUT, src), uncounted), (("x", Same(0)), {"n": 0})], [
         Case("", lambda n, t: (Buffer(n + 1), t))], "strcpy"),
     Function("StrCopyBuf", "WStrCopyBuf", N, [
-        *copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)), (("x", 9, Same(0)), {"n": 0})], [
+        *copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)),
+        (("x", 9, Same(0)), {"n": 0})], [
         Case("", lambda n, t: (Buffer(n + 1), n + 1, t))], "strlcpy", (0, 2, 1)),
     Function("StrNCopy", "WStrNCopy", N, [
         *copies(lambda src, count: (OUT, src, count)), (("x", Same(0), 9), {"n": 0})], [
         Case("with the terminator", lambda n, t: (Buffer(n + 4), t, n + 4)),
         Case("truncated", lambda n, t: (Buffer(n), t + "more", n))], "strncpy"),
 
-    Function("StrCat", "WStrCat", ["1", "d", "n"], appends(lambda dst, src, *_: (dst, src), uncounted), [
+    Function("StrCat", "WStrCat", APPEND, appends(lambda dst, src, *_: (dst, src), uncounted), [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), t[n // 2:]))], "strcat"),
-    Function("StrCatBuf", "WStrCatBuf", ["1", "d", "n"], appends(lambda dst, src, _, n: (dst, n, src)), [
-        Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:]))], "strlcat", (0, 2, 1)),
-    Function("WStrNCat", "", ["1", "d", "n"], appends(lambda dst, src, num, _: (dst, src, num)), [
+    Function("StrCatBuf", "WStrCatBuf", APPEND, appends(lambda dst, src, _, n: (dst, n, src)), [
+        Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:]))],
+        "strlcat", (0, 2, 1)),
+    Function("WStrNCat", "", APPEND, appends(lambda dst, src, num, _: (dst, src, num)), [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), t[n // 2:], n))]),
-    Function("WStrNCatBuf", "", ["1", "d", "n"], [
+    Function("WStrNCatBuf", "", APPEND, [
         *appends(lambda dst, src, _, n: (dst, n, src, INT_MAX)),
         *appends(lambda dst, src, num, _: (dst, INT_MAX, src, num))], [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:], n))]),
 
     Function("StrChr", "WStrChr", N, find_unit(), [
         Case("not found", lambda n, t: (t, ord("~")))], "strchr", returns="pointer"),
-    Function("StrStr", "WStrStr", ["1", "n", "n m"], find_string(), [
+    Function("StrStr", "WStrStr", FIND, find_string(), [
         Case("found late", lambda n, t: (t[:-4] + "dawn", "dawn")),
         Case("first unit repeated", lambda n, t: ("a" * n, "ab"))], "strstr", returns="pointer"),
-    Function("StrIStr", "WStrIStr", ["1", "n", "n m"], find_string(str.lower), [
+    Function("StrIStr", "WStrIStr", FIND, find_string(str.lower), [
         Case("found late", lambda n, t: (t[:-4] + "dawn", "DaWn")),
-        Case("first unit repeated", lambda n, t: ("a" * n, "Ab"))], "strcasestr", returns="pointer"),
+        Case("first unit repeated", lambda n, t: ("a" * n, "Ab"))],
+        "strcasestr", returns="pointer"),
 
     Function("StrNCmp", "WStrNCmp", N, compares(has_count=True), [
         Case("to the end", lambda n, t: (t, t, n + 4)),
@@ -298,8 +309,10 @@ FUNCTIONS = [
         Case("same case", lambda n, t: (t, t)),
         Case("other case", lambda n, t: (t, t.swapcase()))], "strcasecmp", returns="sign"),
 
-    Function("StrToken", "WStrToken", SET, with_sets(lambda s, dlmt: (s, Words(1), dlmt), token_end), [
-        Case("all tokens", lambda n, t: (t, Words(1), " "), repeats=True)], "strtok_r", (0, 2, 1), returns="pointer"),
+    Function("StrToken", "WStrToken", SET,
+             with_sets(lambda s, dlmt: (s, Words(1), dlmt), token_end), [
+        Case("all tokens", lambda n, t: (t, Words(1), " "), repeats=True)],
+        "strtok_r", (0, 2, 1), returns="pointer"),
     Function("StrSplit", "WStrSplit", SET, with_sets(lambda s, dlmt: (s, dlmt, Words(len(s)))), [
         Case("", lambda n, t: (t, " ", Words(n // 2)))], "peer_split", returns="number"),
     Function("StrTrim", "WStrTrim", SET, [

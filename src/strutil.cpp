@@ -46,7 +46,6 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 // Wrong code from GCC 12 at "-Os -fno-inline-small-functions -fno-inline-functions-called-once": a
 // caller keeps values in r1 to r3 across a call that overwrites them. The test is suite_calls.
 #pragma GCC optimize("no-ipa-ra")
-#pragma GCC optimize("no-ipa-sra")  // GCC 14: -Og and -O1 would make other code than -O2
 #endif
 
 // Then those that save cycles or bytes. A figure says how much more the fast code takes WITHOUT the
