@@ -1,5 +1,5 @@
-# compile_by_clang(OBJECT OPTION...): compiles the module for the target by Clang, beside the compiler
-# of the toolchain file.
+# compile_by_clang(OBJECT OPTION...): compiles strutil.cpp for the target with Clang, in a build whose
+# compiler is GCC.
 find_program(CLANG clang++-19)
 set(clang_for_target ${CLANG} --target=arm-none-eabi -mcpu=cortex-m0plus -ffreestanding)
 file(GLOB headers ${PROJECT_SOURCE_DIR}/include/*.h)

@@ -10,10 +10,10 @@ install(DIRECTORY include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/strutil)
 install(EXPORT strutil NAMESPACE strutil:: DESTINATION ${package} FILE strutil-targets.cmake)
 install(FILES cmake/strutil-config.cmake DESTINATION ${package})
 
-# The version file accepts a project whose compiler defines the processor's macros with values no less than
-# here, and the same float ABI. Preprocessing gives the values of here; the names in quotes stay. A compiler
-# that says Arm state before ARMv6 was not given a processor yet: maybe a target gives it. Code for ARMv6-M is
-# accepted there, because every Cortex-M runs it.
+# The version file compares predefined macros: the user's compiler must define each macro in processor.in with
+# an equal or greater value, and use the same float ABI. Here the compiler replaces the names that are not in
+# quotes by their values. A compiler that reports Arm state before ARMv6 has probably been given no -mcpu yet
+# (a target may give it), so a package for ARMv6-M, which runs on every Cortex-M, is accepted there.
 separate_arguments(flags UNIX_COMMAND "${CMAKE_CXX_FLAGS}")
 execute_process(COMMAND ${CMAKE_CXX_COMPILER} ${flags} -E -P -x c++ ${PROJECT_SOURCE_DIR}/cmake/processor.in
   OUTPUT_VARIABLE fits)
