@@ -6,11 +6,13 @@ writes all of these."""
 import difflib
 import math
 import re
+import reprlib
 import subprocess
 import sys
 from dataclasses import dataclass, field
 from itertools import product
 from pathlib import Path
+from typing import NamedTuple
 
 import costs
 import page
@@ -33,8 +35,7 @@ def loops_of(build):
     return page.LOOPS if build.endswith(("O2", "O3")) else ("loops-" + build[-2:],)
 
 
-@dataclass
-class Ratio:
+class Ratio(NamedTuple):
     """Our cycles / those of the fastest of others: the geometric mean over so many cases, and in
     how many of them ours takes more than 2 % more."""
     mean: float
@@ -189,19 +190,13 @@ def check_cost(build, function, cost, cycles, bytes, stack):
         arguments, lengths = function.calls[number]
         slack.append(cost.of(lengths) - found)
         if slack[-1] < 0:
-            sys.exit(f"{build}: {title} takes {found} cycles with {shown(arguments)}, and its "
-                     f"upper bound is {cost.formula()} = {cost.of(lengths):g}. {WHAT_TO_DO}")
+            sys.exit(f"{build}: {title} takes {found} cycles with {reprlib.repr(arguments)}, its "
+                     f"bound is {cost.formula()} = {cost.of(lengths):g}. {WHAT_TO_DO}")
     if min(slack) >= 1:
         sys.exit(f"{build}: {title}: no call comes near its bound, {cost.formula()}. {WHAT_TO_DO}")
     if (bytes, stack) != (cost.bytes, cost.stack):
         sys.exit(f"{build}: {title} has {bytes} bytes and takes {stack} of stack, costs.csv has "
                  f"{cost.bytes} and {cost.stack}. {WHAT_TO_DO}")
-
-
-def shown(arguments):
-    """The arguments, of long strings the beginning."""
-    parts = map(repr, arguments)
-    return "(" + ", ".join(part if len(part) < 40 else part[:30] + "...'" for part in parts) + ")"
 
 
 def check_build(images, build, stated, is_compared):

@@ -4,7 +4,7 @@ from dataclasses import dataclass
 from itertools import product
 from typing import Callable, NamedTuple
 
-from core import Buffer, Same, Words
+from core import SAME, Buffer
 
 INT_MAX = 0x7FFFFFFF
 OUT = Buffer(None)  # as large as need be
@@ -107,7 +107,6 @@ def compares(ignores_case=False, has_count=False):
                 yield (one + end1, two + end2, count), {"n": taken(len(one), count)}
         else:
             yield (one + end1, two + end2), {"n": len(one)}
-    yield ("x", Same(0), 9)[:3 if has_count else 2], {"n": 0}
 
 
 def token_end(string, members):
@@ -167,18 +166,13 @@ def arrays():
 
 
 def escapes():
+    """With every capacity at which the last unit is the first that may not fit."""
     written = {"x": 1, "\n": 6, "\uffff": 9}
     for string in strings(*written):
         size = sum(written[unit] for unit in string)
-        truncating = range(max(size - 10, 0), size) if len(string) < 16 else []
-        for capacity in (*truncating, size, size + 1, INT_MAX):
-            room, n = capacity - 1, 0
-            for unit in string:
-                n += 1  # the unit that does not fit is read
-                room -= written[unit]
-                if room < 0:
-                    break
-            yield (string, OUT, capacity), {"n": n}
+        last = written[string[-1]] if string else 1
+        for capacity in (*range(size - last + 1, size + 2), INT_MAX):
+            yield (string, OUT, capacity), {"n": len(string)}
     for unit in "\x80\u0100\u0fff\u1000~\x7f":
         yield (unit, OUT, 20), {"n": 1}
 
@@ -262,15 +256,12 @@ FUNCTIONS = [
     Function("StrLower", "WStrLower", N, one_string("1", "A", "a", "{"), [
         Case("mixed case", lambda n, t: (t,))], "strlwr", returns="pointer"),
 
-    Function("StrCopy", "WStrCopy", N, [
-        *copies(lambda src, _: (OUT, src), uncounted), (("x", Same(0)), {"n": 0})], [
+    Function("StrCopy", "WStrCopy", N, copies(lambda src, _: (OUT, src), uncounted), [
         Case("", lambda n, t: (Buffer(n + 1), t))], "strcpy"),
-    Function("StrCopyBuf", "WStrCopyBuf", N, [
-        *copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)),
-        (("x", 9, Same(0)), {"n": 0})], [
+    Function("StrCopyBuf", "WStrCopyBuf", N,
+             copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)), [
         Case("", lambda n, t: (Buffer(n + 1), n + 1, t))], "strlcpy", (0, 2, 1)),
-    Function("StrNCopy", "WStrNCopy", N, [
-        *copies(lambda src, count: (OUT, src, count)), (("x", Same(0), 9), {"n": 0})], [
+    Function("StrNCopy", "WStrNCopy", N, copies(lambda src, count: (OUT, src, count)), [
         Case("with the terminator", lambda n, t: (Buffer(n + 4), t, n + 4)),
         Case("truncated", lambda n, t: (Buffer(n), t + "more", n))], "strncpy"),
 
@@ -310,11 +301,12 @@ FUNCTIONS = [
         Case("other case", lambda n, t: (t, t.swapcase()))], "strcasecmp", returns="sign"),
 
     Function("StrToken", "WStrToken", SET,
-             with_sets(lambda s, dlmt: (s, Words(1), dlmt), token_end), [
-        Case("all tokens", lambda n, t: (t, Words(1), " "), repeats=True)],
+             with_sets(lambda s, dlmt: (s, bytes(4), dlmt), token_end), [
+        Case("all tokens", lambda n, t: (t, bytes(4), " "), repeats=True)],
         "strtok_r", (0, 2, 1), returns="pointer"),
-    Function("StrSplit", "WStrSplit", SET, with_sets(lambda s, dlmt: (s, dlmt, Words(len(s)))), [
-        Case("", lambda n, t: (t, " ", Words(n // 2)))], "peer_split", returns="number"),
+    Function("StrSplit", "WStrSplit", SET,
+             with_sets(lambda s, dlmt: (s, dlmt, bytes(4 * len(s)))), [
+        Case("", lambda n, t: (t, " ", bytes(2 * n)))], "peer_split", returns="number"),
     Function("StrTrim", "WStrTrim", SET, [
         *with_sets(lambda s, members: (s, members)),
         *(((s, 0), {"n": len(s), "m": 0}) for s in strings("x"))], [
@@ -325,8 +317,7 @@ FUNCTIONS = [
         Case("one unit by two", lambda n, t: (t, " ", "__", Buffer(n + t.count(" ") + 1)))],
         "peer_replace", returns="number", nulls=(0, 1, 2)),
     Function("StrReplace", "WStrReplace", ["1", "n", "n m", "m", "w"], [
-        *replaces(0), (("x", "a", "y", Same(0)), {"n": 1, "m": 1, "w": 1, "r": 1})], [],
-        about="null result"),
+        *replaces(0), *replaces(SAME)], [], about="null result", nulls=(0, 1, 2)),
 
     Function("IntToStr", "IntToWStr", ["1", "k"], integers(), [
         Case("radix 10", lambda n, t: (int(DIGITS[:n]), Buffer(n + 1), 10), DIGIT_SIZES)],

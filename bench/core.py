@@ -18,24 +18,15 @@ STACK_TOP = RAM + RAM_SIZE
 ENDLESS = 5_000_000  # cycles: no call of the search takes a tenth of that
 PAGE = 0x1000
 FILL = 0xA5  # what a watched buffer has in it before a call
+SAME = object()  # an argument that is the same pointer as the first
 CODECS = {1: "latin-1", 2: "utf-16-le"}  # by the bytes of a unit
-
-
-class Same(NamedTuple):
-    """An argument that is the same pointer as an earlier one."""
-    index: int
 
 
 class Buffer(NamedTuple):
     """An argument that has room for so many units, or for as many as need be, and may hold
     a string."""
     units: int | None
-    held: str | None = None
-
-
-class Words(NamedTuple):
-    """An argument that points to so many integers or pointers. All are 0."""
-    count: int
+    held: str | bytes = b""
 
 
 class Stopped(Exception):
@@ -103,12 +94,8 @@ class Core:
                  for page in range(address // PAGE, (address + len(data) - 1) // PAGE + 1)}
         if not pages.isdisjoint(range(RAM // PAGE, STACK_TOP // PAGE)):
             raise BadImage(f"has something at {RAM:#x}, where the simulated caller is")
-        for page in sorted(pages):
-            if page - 1 not in pages:
-                end = page + 1
-                while end in pages:
-                    end += 1
-                self.uc.mem_map(page * PAGE, (end - page) * PAGE)
+        for page in pages:
+            self.uc.mem_map(page * PAGE, PAGE)
         for address, data in segments:
             self.uc.mem_write(address, data)
 
@@ -164,18 +151,16 @@ class Core:
 
     def put(self, place, argument, width):
         """Writes what a pointer's argument holds to its place."""
-        string = argument.held if isinstance(argument, Buffer) else argument
-        if isinstance(argument, Words):
-            held = bytes(4 * argument.count)
-        else:
-            held = b"" if string is None else (string + "\0").encode(CODECS[width])
+        held = argument.held if isinstance(argument, Buffer) else argument
+        if isinstance(held, str):
+            held = (held + "\0").encode(CODECS[width])
         self.uc.mem_write(place, held)
         if self.watches:
             size = len(held)
             if isinstance(argument, Buffer):
                 size = STRIDE if argument.units is None else argument.units * width
                 self.uc.mem_write(place + len(held), bytes([FILL]) * (size - len(held)))
-            if not isinstance(argument, Words):
+            if not isinstance(argument, bytes):
                 self.buffers.append((place, size))
             start = place - DATA
             self.readable[start:start + len(held)] = b"\1" * len(held)
@@ -183,8 +168,9 @@ class Core:
 
     def run(self, symbol, arguments, widths, misaligned=False, order=()):
         """Puts the arguments into memory and makes a call with all of them, or in an order of its
-        own. `widths` are the bytes of a unit of the first argument and of the others; misaligned
-        arguments are not word-aligned."""
+        own. An argument is a number, a string, a buffer, or the bytes of integers or pointers.
+        `widths` are the bytes of a unit of the first argument and of the others; misaligned strings
+        are not word-aligned."""
         self.outside = None
         if self.watches:
             self.readable, self.writable = bytearray(DATA_SIZE), bytearray(DATA_SIZE)
@@ -194,10 +180,10 @@ class Core:
             width = widths[index > 0]
             if isinstance(argument, int):
                 place = argument
-            elif isinstance(argument, Same):
-                place = self.places[argument.index]
+            elif argument is SAME:
+                place = self.places[0]
             else:
-                if misaligned and not isinstance(argument, Words):
+                if misaligned and not isinstance(argument, bytes):
                     place += width * (3 if index else 1)
                 self.put(place, argument, width)
             self.places.append(place)

@@ -16,7 +16,7 @@ SYMBOLS = api.functions(SOURCE)
 FILE = Path(__file__).with_name("costs.csv")
 BUILDS = {"gcc-O2": "GCC -O2", "clang-O2": "Clang -O2", "gcc-Os": "GCC -Os",
           "clang-Os": "Clang -Os"}
-WORST = 3  # calls of each kind that are made again later
+WORST = 6  # calls of a function that are made again later
 
 # What a bound is a sum of.
 TERMS = {
@@ -94,26 +94,18 @@ def fit(function, cycles):
 
 
 def fit_function(core, function):
-    """The cost of a function in a build. The calls that are made again later are, each of another
-    length, those nearest to the bound, by cycles and by the ratio; and the one with the deepest
-    stack."""
+    """The cost of a function in a build. The calls that are made again later are those nearest to
+    the bound, each of another length, and the one with the deepest stack."""
     numbers = range(len(function.calls))
     cycles, stack, parts = search(core, function, function.names(), numbers)
     bytes = max(sum(one.values()) for one in parts)
     cost = Cost(fit(function, cycles), bytes, max(stack.values()))
-    bounds = [cost.of(lengths) for _, lengths in function.calls]
-    by_cycles = sorted(numbers, key=lambda number: bounds[number] - cycles[number])
-    by_ratio = sorted(numbers, key=lambda number: bounds[number] / cycles[number])
-    cost.worst = {*first_of_lengths(function, by_cycles), *first_of_lengths(function, by_ratio),
-                  max(numbers, key=stack.get)}
+    lengths = [lengths for _, lengths in function.calls]
+    nearest = {}
+    for number in sorted(numbers, key=lambda one: cost.of(lengths[one]) - cycles[one]):
+        nearest.setdefault(tuple(lengths[number].values()), number)
+    cost.worst = {*list(nearest.values())[:WORST], max(numbers, key=stack.get)}
     return cost
-
-
-def first_of_lengths(function, numbers):
-    found = {}
-    for number in numbers:
-        found.setdefault(tuple(function.calls[number][1].values()), number)
-    return list(found.values())[:WORST]
 
 
 def write(costs, versions):
