@@ -24,7 +24,7 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 
 // Options for this file, because users' flags cannot be relied on. First those that keep promises:
 // no call of a C library, no constant data, no unwind tables. Without any of these lines
-// tests/check-object fails, or the test that the line names.
+// tests/check-object fails, with the compiler that the line names, or the test that it names.
 #if defined(__clang__)
 #pragma clang attribute push
 #pragma clang attribute(__attribute__((no_builtin)), apply_to = function)  // strlen (Clang 22)
@@ -38,9 +38,6 @@ extern "C" uint64_t __aeabi_idivmod(int dividend, int divisor) noexcept;  // NOL
 #pragma GCC optimize("Os", "inline")  // without "inline", -O0 would inline nothing
 #endif
 #pragma GCC optimize("no-stack-protector", "no-exceptions")
-#if __GNUC__ >= 12
-#pragma GCC optimize("trivial-auto-var-init=uninitialized")  // memset
-#endif
 // Loops become library calls, or vectors with constant data. The first also costs 2.4 %, 388 bytes.
 #pragma GCC optimize("no-tree-loop-optimize", "no-tree-slp-vectorize")
 // Wrong code from GCC 12 at "-Os -fno-inline-small-functions -fno-inline-functions-called-once": a
