@@ -39,8 +39,8 @@ TEST_CASE_TEMPLATE("StrLen, StrUpper, StrLower: examples", Unit, char, WCHAR) {
 }
 
 TEST_CASE("CharToLower, CharToUpper: the 26 letters and nothing else") {
-  for (int c = -200; c < 400; ++c) {
-    for (const unsigned high : {0U, 1U << 8, 1U << 15, 1U << 16, 1U << 24, 1U << 31}) {
+  for (int c = -200; c < (isFast ? 70000 : 400); ++c) {
+    for (const unsigned high : {0U, 1U << 8, 1U << 24, 1U << 31}) {
       const int value = c ^ static_cast<int>(high);
       for (const auto& function : ofInts) check(function, {{u""}, {value}}, 0);
     }
@@ -131,7 +131,7 @@ TEST_CASE_TEMPLATE("StrToken, StrSplit, StrTrim: examples", Unit, char, WCHAR) {
   Unit* const text = memory.get();
   CHECK(twin<Unit>(StrToken, WStrToken)(text, nullptr, text + 4) == nullptr);
   CHECK(twin<Unit>(StrSplit, WStrSplit)(text, text + 4, nullptr) == 0);
-  CHECK(memory.holds(u""));
+  CHECK_MESSAGE(memory.holds(u""), memory.shown());
 }
 
 TEST_CASE_TEMPLATE("StrReplace: examples", Unit, char, WCHAR) {

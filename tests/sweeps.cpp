@@ -121,13 +121,17 @@ void checkUnits(const Function<To, From>& function) {
   for (const char16_t unit : unitsToTry<From>()) {
     // Each beside units that code might take for it.
     std::vector<int> others = {unit ^ 0x20, '7'};
-    if (isFast) others.insert(others.end(), {unit, unit + 1, unit - 1, unit ^ 0x80, unit ^ 0x100});
+    if (isFast) {
+      others.insert(others.end(), {unit, unit + 1, unit - 1, unit + 0x20, unit - 0x20, unit ^ 0x80,
+                                   unit ^ 0x100});
+    }
     for (const int other : others) {
       if (other < 1 || other > greatest) continue;
       const Units one(1, unit);
       const Units two(1, static_cast<char16_t>(other));
       check(function, argsFor(function, {one + two + one, two, one}, 40), ++seed);
       check(function, argsFor(function, {one, two, u"7"}, 40), ++seed);
+      check(function, argsFor(function, {two, one + two, u"7"}, 40), ++seed);
     }
   }
   Units all;
