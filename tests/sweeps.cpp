@@ -107,7 +107,7 @@ Units unitsToTry() {
   for (char16_t unit = 1; unit < 256; ++unit) {
     if (isBoard && boundaries.find(unit) == Units::npos) continue;
     units += unit;
-    for (const int wide : {unit | 0x100, unit | 0x2000, unit | 0x8000, unit | 0xff00, unit << 8}) {
+    for (const int wide : {unit | 0x100, unit | 0x2100, unit | 0x8000, unit | 0xff00, unit << 8}) {
       if (isWide<From>) units += static_cast<char16_t>(wide);
     }
   }
