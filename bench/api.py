@@ -1,5 +1,4 @@
-#!/usr/bin/python3 -B
-"""api.py SOURCE: prints the names of the library's functions, as SubName.h has them."""
+"""The names of the library's functions, as SubName.h has them."""
 import re
 import sys
 from pathlib import Path
@@ -12,7 +11,3 @@ def functions(source):
     if not found:
         sys.exit("include/SubName.h: no function is found")
     return dict(found)
-
-
-if __name__ == "__main__":
-    print("\n".join(functions(sys.argv[1])))
