@@ -31,8 +31,8 @@ class StillNeeded(Exception):
     """A register was taken for one that is not read again, at a place where states meet."""
 
 
-class ReadsNew(Exception):
-    """A state is about to read a unit for the first time, before which others may meet it."""
+class Reads(Exception):
+    """A state is about to read a unit, before which others may meet it."""
 
 
 class Dropped:
@@ -144,50 +144,57 @@ def differ(a, b):
 
 
 class Flags:
-    """What the last instruction that sets flags has left: its result, of which N and Z are, and C and V.
-    `compared` are the operands of a subtraction, of which most conditions ask directly."""
+    """What the last instruction that sets flags has left. N and Z are of its result; C and V follow from the
+    operands of a sum or a difference, else they are as `before`, but for the bit that a shift moved out."""
 
-    def __init__(self, result, carry, overflow, compared=None):
-        self.result, self.carry, self.overflow, self.compared = result, carry, overflow, compared
+    def __init__(self, result, before=None, sum=None, difference=None, moved=None):
+        self.result, self.sum, self.difference, self.moved = result, sum, difference, moved
+        is_plain = isinstance(before, Flags) and not (before.sum or before.difference) and before.moved is None
+        self.before = before.before if is_plain else before
+
+    def n(self):
+        return has_bit(self.result, 31)
+
+    def z(self):
+        return is_equal(self.result, 0)
+
+    def c(self):
+        if self.moved is not None:
+            return self.moved
+        if self.sum:
+            return is_lower(self.result, self.sum[0])
+        return negation(is_lower(*self.difference)) if self.difference else self.earlier().c()
+
+    def v(self):
+        if self.sum:
+            a, b = self.sum
+            return has_bit(bit_and(bit_xor(a, self.result), bit_xor(b, self.result)), 31)
+        if self.difference:
+            a, b = self.difference
+            return has_bit(bit_and(bit_xor(a, b), bit_xor(a, self.result)), 31)
+        return self.earlier().v()
+
+    def earlier(self):
+        if isinstance(self.before, Dropped):
+            raise StillNeeded(*self.before.place)
+        if self.before is None:
+            raise GivenUp("reads a flag that no instruction has set")
+        return self.before
 
     def has(self, number):
         """Whether a condition of the manual's table holds: EQ, NE, CS, CC and so on."""
-        if self.compared:
-            a, b = self.compared
-            asked = {0: lambda: is_equal(a, b), 1: lambda: negation(is_lower(a, b)), 4: lambda: is_lower(b, a),
-                     5: lambda: negation(is_less(a, b)), 6: lambda: is_less(b, a)}
+        if self.difference and number >> 1 in (0, 4, 5, 6):
+            a, b = self.difference
+            found = {0: is_equal(a, b), 4: is_lower(b, a), 5: negation(is_less(a, b)),
+                     6: is_less(b, a)}[number >> 1]
+        elif number >> 1 < 4:
+            found = [self.z, self.c, self.n, self.v][number >> 1]()
+        elif number >> 1 == 4:
+            found = negation(either(negation(self.c()), self.z()))
         else:
-            asked = {0: lambda: self.zero(), 1: lambda: self.own(self.carry),
-                     4: lambda: negation(either(negation(self.own(self.carry)), self.zero())),
-                     5: lambda: negation(differ(self.negative(), self.own(self.overflow))),
-                     6: lambda: negation(either(self.zero(),
-                                                differ(self.negative(), self.own(self.overflow))))}
-        asked.update({2: self.negative, 3: lambda: self.own(self.overflow)})
-        found = asked[number >> 1]()
+            is_less_than = differ(self.n(), self.v())
+            found = negation(is_less_than if number >> 1 == 5 else either(self.z(), is_less_than))
         return negation(found) if number & 1 else found
-
-    def negative(self):
-        return has_bit(self.own(self.result), 31)
-
-    def zero(self):
-        return is_equal(self.own(self.result), 0)
-
-    def own(self, value):
-        if isinstance(value, Dropped):
-            raise StillNeeded(*value.place)
-        if value is None:
-            raise GivenUp("reads a flag that no instruction has set")
-        return value
-
-
-def flags_of_sum(a, b, result):
-    signs = bit_and(bit_xor(a, result), bit_xor(b, result))
-    return Flags(result, is_lower(result, a), has_bit(signs, 31))
-
-
-def flags_of_difference(a, b, result):
-    signs = bit_and(bit_xor(a, b), bit_xor(a, result))
-    return Flags(result, negation(is_lower(a, b)), has_bit(signs, 31), (a, b))
 
 
 class Memory:
@@ -196,18 +203,20 @@ class Memory:
     function read before it wrote there itself counts only."""
 
     def __init__(self, segments):
-        self.segments = segments
+        self.segments, self.paced = segments, set()
         self.sizes, self.cells, self.read, self.written = {}, {}, {}, {}
         self.give(STACK_TOP - STACK_SIZE, 4, [0xAAAAAAAA] * (STACK_SIZE // 4))
 
-    def give(self, address, size, units):
+    def give(self, address, size, units, paced=False):
         for index, unit in enumerate(units):
+            if paced:
+                self.paced.add(address + size * index)
             self.cells[address + size * index] = unit
             self.sizes[address + size * index] = size
 
     def copy(self):
         other = Memory.__new__(Memory)
-        other.segments, other.sizes = self.segments, self.sizes
+        other.segments, other.sizes, other.paced = self.segments, self.sizes, self.paced
         other.cells, other.read, other.written = dict(self.cells), dict(self.read), dict(self.written)
         return other
 
@@ -267,13 +276,15 @@ class State:
     """A moment of some paths: `path` is true in the solver where the contents take one of them, `example`
     are such contents, `cycles` the most that any of them took, `lowest` the lowest stack pointer."""
 
-    def __init__(self, registers, memory, path, example):
-        self.r, self.memory, self.path, self.example = registers, memory, path, example
+    def __init__(self, registers, memory, path):
+        self.r, self.memory, self.path = registers, memory, path
         self.cycles, self.lowest, self.resumed = 0, STACK_TOP, False
+        self.facts, self.is_checked, self.is_paused, self.reads_new, self.loads = {}, False, False, False, 0
 
     def copy(self):
-        other = State(list(self.r), self.memory.copy(), self.path, self.example)
-        other.cycles, other.lowest = self.cycles, self.lowest
+        other = State(list(self.r), self.memory.copy(), self.path)
+        other.loads = self.loads
+        other.cycles, other.lowest, other.facts = self.cycles, self.lowest, dict(self.facts)
         return other
 
     def get(self, register):
@@ -284,8 +295,10 @@ class State:
 
     def load(self, address, size):
         self.check_stack(address)
-        if not self.resumed and self.memory.is_new(address):
-            raise ReadsNew
+        if is_number(address) and address in self.memory.paced:
+            if not self.resumed:
+                raise Reads(self.memory.is_new(address))
+            self.loads += 1
         return self.memory.load(address, size)
 
     def store(self, address, size, value):
@@ -296,16 +309,10 @@ class State:
         if is_number(address) and STACK_TOP - STACK_SIZE <= address < self.r[SP]:
             raise Broken("an access below the stack pointer, where interrupts write")
 
-    def set_flags(self, result, **changed):
-        """N and Z are of the result; C and V stay, or change as the arguments say."""
-        old = self.r[FLAGS]
-        if isinstance(old, Dropped):
-            old = Flags(old, old, old)
-        self.r[FLAGS] = Flags(result, changed.get("carry", old.carry), changed.get("overflow", old.overflow))
-
-    def set_result(self, register, value, **changed):
+    def set_result(self, register, value, moved=None):
+        """A result that changes N and Z, and C if a shift moved out a bit."""
         self.r[register] = value
-        self.set_flags(value, **changed)
+        self.r[FLAGS] = Flags(value, self.r[FLAGS], moved=moved)
 
     def move_stack(self, value):
         if not is_number(value):
@@ -352,7 +359,7 @@ def shift_immediate(kind):
         if kind == "LSL" and amount == 0:  # MOVS between registers
             return s.set_result(low(op, 0), value)
         value, carry = shifted(value, amount or 32, kind)
-        s.set_result(low(op, 0), value, carry=carry)
+        s.set_result(low(op, 0), value, carry)
     return execute
 
 
@@ -364,27 +371,27 @@ def shift_register(kind):
         if amount & 0xFF == 0:
             return s.set_result(d, s.get(d))
         value, carry = shifted(s.get(d), amount & 0xFF, kind)
-        s.set_result(d, value, carry=carry)
+        s.set_result(d, value, carry)
     return execute
 
 
 def set_sum(s, d, a, b):
     result = add(a, b)
-    s.r[FLAGS] = flags_of_sum(a, b, result)
+    s.r[FLAGS] = Flags(result, sum=(a, b))
     if d is not None:
         s.r[d] = result
 
 
 def set_difference(s, d, a, b):
     result = subtract(a, b)
-    s.r[FLAGS] = flags_of_difference(a, b, result)
+    s.r[FLAGS] = Flags(result, difference=(a, b))
     if d is not None:
         s.r[d] = result
 
 
 def add_with_carry(s, d, a, b):
     """a + b + C, which ADCS does as it is and SBCS with the complement of b."""
-    carry = s.get(FLAGS).own(s.r[FLAGS].carry)
+    carry = s.get(FLAGS).c()
     if isinstance(carry, bool) and is_number(a) and is_number(b):
         whole = a + b + carry
         result, carry = whole & MASK, whole > MASK
@@ -393,8 +400,7 @@ def add_with_carry(s, d, a, b):
             z3.If(carry, z3.BitVecVal(1, 33), z3.BitVecVal(0, 33))
         whole = z3.ZeroExt(1, term(a)) + z3.ZeroExt(1, term(b)) + bit
         result, carry = simple(z3.Extract(31, 0, whole)), z3.simplify(z3.Extract(32, 32, whole) == 1)
-    s.r[d] = result
-    s.r[FLAGS] = Flags(result, carry, flags_of_sum(a, b, result).overflow)
+    s.set_result(d, result, carry)
 
 
 def logical(operation):
@@ -404,7 +410,7 @@ def logical(operation):
 
 
 def tst(s, op):
-    s.set_flags(bit_and(s.get(low(op, 0)), s.get(low(op, 3))))
+    s.r[FLAGS] = Flags(bit_and(s.get(low(op, 0)), s.get(low(op, 3))), s.r[FLAGS])
 
 
 def mov_high(s, op):
@@ -638,15 +644,13 @@ class Machine:
     def run(self, pc, arguments, memory, conditions):
         """All states in which a call ends. `conditions` hold of the arguments and the contents."""
         while True:
-            self.solver = z3.SolverFor("QF_BV")
+            self.solver = z3.SimpleSolver()
             self.solver.set("timeout", CHECK_LIMIT)
             self.solver.add(*conditions)
-            self.numbers = count()
+            self.numbers, self.kept = count(), []
             registers = list(arguments) + [0xDEAD0000 + 4 * n for n in range(len(arguments), 13)]
-            registers += [STACK_TOP, RETURN | 1, pc, Flags(None, None, None)]
-            start = State(registers, memory.copy(), z3.BoolVal(True), self.example())
-            if start.example is None:
-                raise GivenUp("no arguments meet the conditions")
+            registers += [STACK_TOP, RETURN | 1, pc, Flags(0)]
+            start = State(registers, memory.copy(), z3.BoolVal(True))
             try:
                 return self.explore(start)
             except StillNeeded as place:
@@ -673,15 +677,16 @@ class Machine:
         self.wait(start)
         while self.queue:
             state = self.waiting.pop(heapq.heappop(self.queue)[-1])
-            state.resumed = True
+            if state.is_paused and state.reads_new and not state.is_checked and self.example(state.path) is None:
+                continue
+            state.is_checked, state.resumed, state.is_paused = state.is_paused, state.is_paused, False
             try:
                 self.advance(state, ended)
             except Broken as broken:
-                broken.state = state
-                state.example = self.example(state.path)
-                if state.example is not None:
+                if self.example(state.path) is not None:
+                    broken.state = state
                     raise
-        return ended
+        return [state for state in ended if self.example(state.path) is not None]
 
     def wait(self, state):
         pc = state.r[PC]
@@ -692,7 +697,7 @@ class Machine:
             self.merge(self.waiting[key], state)
         else:
             self.waiting[key] = state
-            heapq.heappush(self.queue, (len(state.memory.read), next(self.numbers), key))
+            heapq.heappush(self.queue, (state.loads, next(self.numbers), key))
 
     def merge(self, one, other):
         for register, value in enumerate(one.r):
@@ -707,6 +712,9 @@ class Machine:
                 if not is_same(a, b):
                     ours[cell] = z3.If(one.path, a, b)
         one.path = self.named(z3.Or(one.path, other.path))
+        one.facts = {number: holds for number, holds in one.facts.items() if other.facts.get(number) == holds}
+        one.is_checked = one.is_checked or other.is_checked
+        one.is_paused = one.is_paused or other.is_paused
         one.cycles = max(one.cycles, other.cycles)
         one.lowest = min(one.lowest, other.lowest)
 
@@ -715,6 +723,9 @@ class Machine:
         while True:
             pc = s.r[PC]
             if pc == RETURN & ~1:
+                for register in (0, *KEPT):
+                    s.get(register)
+                s.is_checked = False
                 ended.append(s)
                 return
             op, row = self.fetch(pc)
@@ -727,43 +738,50 @@ class Machine:
             s.r[PC] = pc + (4 if op > 0xFFFF else 2)
             try:
                 row[4](s, op)
-            except ReadsNew:
-                s.r[PC] = pc
+            except Reads as reads:
+                s.r[PC], s.is_paused, s.reads_new = pc, True, reads.args[0]
                 return self.wait(s)
             s.cycles += row[3]
             s.resumed = False
 
     def branch(self, s, op):
-        """A conditional branch: whether it went both ways, and both states wait."""
-        flags = s.get(FLAGS)
-        taken = flags.has(op >> 8 & 15)
-        if not isinstance(taken, bool):
-            taken = z3.simplify(taken)
-            if z3.is_true(taken) or z3.is_false(taken):
-                taken = z3.is_true(taken)
-        target = s.r[PC] + 2 + ((op & 0xFF ^ 0x80) - 0x80) * 2
+        """A conditional branch: whether it goes both ways, and both states wait."""
+        taken = s.get(FLAGS).has(op >> 8 & 15)
         s.cycles += 1
         if not isinstance(taken, bool):
-            is_known = z3.is_true(s.example.eval(taken, True))
-            contrary = z3.Not(taken) if is_known else taken
-            contrary_path = self.named(z3.And(s.path, contrary))
-            example = self.example(contrary_path)
-            if example is not None:
-                other = s.copy()
-                other.example, other.path = example, contrary_path
-                s.path = self.named(z3.And(s.path, z3.Not(contrary)))
-                for state, goes in ((s, is_known), (other, not is_known)):
-                    if goes:
-                        state.r[PC] = target
-                        state.cycles += 1
-                    state.resumed = False
-                    self.wait(state)
-                return True
-            taken = is_known
-        if taken:
-            s.r[PC] = target
+            taken = self.decided(s, z3.simplify(taken))
+        if isinstance(taken, bool):
+            self.go(s, op, taken)
+            return False
+        other = s.copy()
+        for state, is_taken in ((s, True), (other, False)):
+            self.assume(state, taken, is_taken)
+            self.go(state, op, is_taken)
+            self.wait(state)
+        return True
+
+    def go(self, s, op, is_taken):
+        if is_taken:
+            s.r[PC] += 2 + ((op & 0xFF ^ 0x80) - 0x80) * 2
             s.cycles += 1
-        return False
+
+    def decided(self, s, condition):
+        """What earlier branches of the same path say of a condition, or itself."""
+        if z3.is_true(condition) or z3.is_false(condition):
+            return z3.is_true(condition)
+        if z3.is_not(condition):
+            found = s.facts.get(condition.arg(0).get_id())
+            return condition if found is None else not found
+        found = s.facts.get(condition.get_id())
+        return condition if found is None else found
+
+    def assume(self, s, condition, holds):
+        s.path = self.named(z3.And(s.path, condition if holds else z3.Not(condition)))
+        if z3.is_not(condition):
+            condition, holds = condition.arg(0), not holds
+        self.kept.append(condition)  # so that no other term gets its number
+        s.facts[condition.get_id()] = holds
+        s.is_checked = False
 
 
 def identity(value):
