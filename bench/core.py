@@ -1,16 +1,44 @@
-"""A Cortex-M0+ that counts cycles: Unicorn executes, this adds up the costs of the Technical Reference
-Manual's timing table, with zero wait states and the multiplier of one cycle. What a block of
-instructions costs is worked out once."""
+"""A simulated Cortex-M0+ that counts cycles. Unicorn runs the instructions; this adds up what each takes
+by the timing table of the core's Technical Reference Manual, with zero wait states and the multiplier of
+one cycle. The cycles of a block of instructions are worked out once."""
 from bisect import bisect
+from typing import NamedTuple
 
 import unicorn
-from elftools.elf.elffile import ELFFile
 from unicorn import arm_const as arm
 
-RAM, RAM_SIZE = 0x20000000, 0x40000
+from image import BadImage
+
+# Where the caller's memory is: at the end of the core's SRAM region, where no device has any.
+RAM, RAM_SIZE = 0x3FFC0000, 0x20000
+RETURN = RAM
+DATA, DATA_SIZE = RAM + 0x4000, 0x14000
+STRIDE = 0x4000  # between two arguments
 STACK_TOP = RAM + RAM_SIZE
-DATA, DATA_SIZE = RAM + 0x4000, 0x30000  # the callers' buffers are here
-RETURN = 0x000F0000  # flash that no image uses
+ENDLESS = 50_000_000  # cycles
+PAGE = 0x1000
+FILL = 0xA5  # what a watched buffer has in it before a call
+CODECS = {1: "latin-1", 2: "utf-16-le"}  # by the bytes of a unit
+
+
+class Same(NamedTuple):
+    """An argument that is the same pointer as an earlier one."""
+    index: int
+
+
+class Buffer(NamedTuple):
+    """An argument that has room for so many units, or for as many as need be, and may hold a string."""
+    units: int | None
+    held: str | None = None
+
+
+class Words(NamedTuple):
+    """An argument that points to so many integers or pointers. All are 0."""
+    count: int
+
+
+class Stopped(Exception):
+    """Why a call did not return."""
 
 
 def cost(op, size):
@@ -37,7 +65,7 @@ def pushed(op):
         return (op & 0x1FF).bit_count() * (-4 if op & 0x800 else 4)
     if op & 0xFF00 == 0xB000:  # SUB, ADD
         return (op & 0x7F) * (4 if op & 0x80 else -4)
-    return float("inf") if op & 0xFF87 in (0x4485, 0x4685) else 0  # ADD, MOV to SP: not to be told
+    return float("inf") if op & 0xFF87 in (0x4485, 0x4685) else 0  # ADD, MOV to SP: cannot be told
 
 
 def is_conditional(op):
@@ -45,64 +73,52 @@ def is_conditional(op):
 
 
 class Core:
-    """A linked image. After call(): `cycles`, `result` and `stack` in bytes; `reads_past`, whether a call
-    since forget_given() read what the caller did not give, if that is watched; and `directions`, which
-    ways the conditional branches went in all calls: pairs of the address behind one, and whether it was
-    taken."""
+    """A core with an image in its memory. After run(): `cycles`; `stack`, the most bytes below the caller's
+    stack pointer; `result`, the register R0; `registers`, the arguments as numbers; and, if memory is
+    watched, `outside`, the first access outside the arguments, or None."""
 
-    def __init__(self, image, watches_reads=False):
+    def __init__(self, image, watches=False):
         self.uc = unicorn.Uc(unicorn.UC_ARCH_ARM, unicorn.UC_MODE_THUMB | unicorn.UC_MODE_MCLASS)
         self.uc.ctl_set_cpu_model(arm.UC_CPU_ARM_CORTEX_M0)
-        self.uc.mem_map(0, 0x100000)
         self.uc.mem_map(RAM, RAM_SIZE)
-        self.functions, self.sizes, self.blocks = {}, [], {}
-        self.directions = set()
-        with open(image, "rb") as file:
-            elf = ELFFile(file)
-            for segment in elf.iter_segments("PT_LOAD"):
-                self.uc.mem_write(segment["p_paddr"], segment.data())
-            symbols = list(elf.get_section_by_name(".symtab").iter_symbols())
-        for symbol in symbols:
-            if symbol["st_info"]["type"] == "STT_FUNC" and symbol["st_shndx"] != "SHN_UNDEF":
-                self.functions[symbol.name] = symbol["st_value"] | 1
-                self.sizes.append((symbol["st_value"] & ~1, symbol["st_size"]))
-        self.sizes.sort()
-        # "$t" is where code begins, "$d" where data does.
-        self.marks = sorted({(symbol["st_value"], symbol.name[:2]) for symbol in symbols
-                             if symbol.name[:2] in ("$t", "$d")})
-        self.forget_given()
+        self.load(image.segments)
+        self.code = image.code
+        self.sizes = {address: max(size for start, size in self.code.values() if start == address)
+                      for address, _ in self.code.values()}
+        self.starts = sorted(self.sizes)
+        self.division = {address for symbol, (address, _) in self.code.items()
+                         if symbol.startswith("__aeabi_")}
+        self.blocks = {}
+        self.watches = watches
         self.uc.hook_add(unicorn.UC_HOOK_BLOCK, self.on_block)
-        if watches_reads:
+        self.uc.hook_add(unicorn.UC_HOOK_MEM_UNMAPPED, self.on_unmapped)
+        if watches:
             self.uc.hook_add(unicorn.UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
             self.uc.hook_add(unicorn.UC_HOOK_MEM_WRITE, self.on_write, None, DATA, DATA + DATA_SIZE - 1)
 
-    def instructions(self, address, size):
-        """Address, operation and width of each instruction of a piece of code."""
+    def load(self, segments):
+        pages = {page for address, data in segments
+                 for page in range(address // PAGE, (address + len(data) - 1) // PAGE + 1)}
+        if not pages.isdisjoint(range(RAM // PAGE, STACK_TOP // PAGE)):
+            raise BadImage(f"has something at {RAM:#x}, where the simulated caller is")
+        for page in sorted(pages):
+            if page - 1 not in pages:
+                end = page + 1
+                while end in pages:
+                    end += 1
+                self.uc.mem_map(page * PAGE, (end - page) * PAGE)
+        for address, data in segments:
+            self.uc.mem_write(address, data)
+
+    def analyse(self, address, size):
+        """Of a block: its cycles, the bytes that it pushes in all and at most, and the address behind it if
+        it ends in a conditional branch."""
         code = bytes(self.uc.mem_read(address, size))
-        at = 0
+        cycles = depth = deepest = at = op = width = 0
         while at < size:
             op = int.from_bytes(code[at:at + 2], "little")
             width = 4 if op >= 0xE800 else 2
-            yield address + at, op, width
             at += width
-
-    def branches(self, name):
-        """The addresses behind the conditional branches of a function, in their order."""
-        start = self.functions[name] & ~1
-        end = start + dict(self.sizes)[start]
-        found = []
-        for (begin, kind), (after, _) in zip(self.marks, [*self.marks[1:], (1 << 32, "")]):
-            begin, after = max(begin, start), min(after, end)
-            if kind == "$t" and begin < after:
-                found += [address + 2 for address, op, _ in self.instructions(begin, after - begin)
-                          if is_conditional(op)]
-        return found
-
-    def analyse(self, address, size):
-        """Cycles, pushed bytes and the most of these of a block, and the address behind it if it ends in a
-        conditional branch."""
-        cycles = depth = deepest = op = width = 0
-        for _, op, width in self.instructions(address, size):
             cycles += cost(op, width)
             depth += pushed(op)
             deepest = max(deepest, depth)
@@ -114,43 +130,95 @@ class Core:
             block = self.blocks[address, size] = self.analyse(address, size)
         cycles, depth, deepest, after = block
         self.cycles += cycles
-        if self.after:
-            taken = self.after != address
-            self.cycles += taken  # a cycle more
-            self.directions.add((self.after, taken))
+        if self.after and self.after != address:
+            self.cycles += 1  # a branch that is taken
         self.after = after
         if deepest:
             self.stack = max(self.stack, self.depth + deepest)
         self.depth += depth
+        if self.cycles > ENDLESS:
+            self.uc.emu_stop()
 
     def parts(self):
-        """The functions that ran since the blocks were cleared, as pairs of address and size."""
-        return {self.sizes[bisect(self.sizes, (address, 0xFFFF)) - 1] for address, _ in self.blocks}
+        """The sizes, by address, of the functions that ran since the blocks were cleared, but for the
+        compiler's division, which most firmware has anyway."""
+        found = {self.starts[bisect(self.starts, address) - 1] for address, _ in self.blocks}
+        return {start: self.sizes[start] for start in found - self.division}
+
+    def on_unmapped(self, _uc, access, address, _size, _value, _):
+        what = {unicorn.UC_MEM_READ_UNMAPPED: "reads", unicorn.UC_MEM_WRITE_UNMAPPED: "writes"}
+        self.why = f"{what.get(access, 'runs')} {address:#x}, where the image has nothing"
+        return False
 
     def on_read(self, _uc, _access, address, size, _value, _):
-        if 0 in self.given[address - DATA:address - DATA + size]:
-            self.reads_past = True
+        if 0 in self.readable[address - DATA:address - DATA + size] and not self.outside:
+            self.outside = f"reads {size} bytes at {address:#x}, outside the arguments"
 
     def on_write(self, _uc, _access, address, size, _value, _):
-        self.given[address - DATA:address - DATA + size] = bytes([1]) * size
+        start = address - DATA
+        if 0 in self.writable[start:start + size] and not self.outside:
+            self.outside = f"writes {size} bytes at {address:#x}, outside the arguments"
+        self.readable[start:start + size] = b"\1" * size
 
-    def give(self, address, data):
-        self.uc.mem_write(address, data)
-        self.given[address - DATA:address - DATA + len(data)] = bytes([1]) * len(data)
+    def put(self, place, argument, width):
+        """Writes what a pointer's argument holds to its place."""
+        string = argument.held if isinstance(argument, Buffer) else argument
+        if isinstance(argument, Words):
+            held = bytes(4 * argument.count)
+        else:
+            held = b"" if string is None else (string + "\0").encode(CODECS[width])
+        self.uc.mem_write(place, held)
+        if self.watches:
+            size = len(held)
+            if isinstance(argument, Buffer):
+                size = STRIDE if argument.units is None else argument.units * width
+                self.uc.mem_write(place + len(held), bytes([FILL]) * (size - len(held)))
+            if not isinstance(argument, Words):
+                self.buffers.append((place, size))
+            start = place - DATA
+            self.readable[start:start + len(held)] = b"\1" * len(held)
+            self.writable[start:start + size] = b"\1" * size
 
-    def forget_given(self):
-        self.given, self.reads_past = bytearray(DATA_SIZE), False
+    def run(self, symbol, arguments, widths, misaligned=False, order=()):
+        """Puts the arguments into memory and makes a call with all of them, or in an order of its own.
+        `widths` are the bytes of a unit of the first argument and of the others; misaligned arguments are
+        not word-aligned."""
+        self.outside = None
+        if self.watches:
+            self.readable, self.writable = bytearray(DATA_SIZE), bytearray(DATA_SIZE)
+        self.places, self.buffers = [], []
+        for index, argument in enumerate(arguments):
+            place = DATA + index * STRIDE
+            width = widths[index > 0]
+            if isinstance(argument, int):
+                place = argument
+            elif isinstance(argument, Same):
+                place = self.places[argument.index]
+            else:
+                if misaligned and not isinstance(argument, Words):
+                    place += width * (3 if index else 1)
+                self.put(place, argument, width)
+            self.places.append(place)
+        self.registers = [self.places[index] for index in order] or self.places
+        self.call(symbol, self.registers)
 
-    def call(self, name, arguments):
+    def call(self, symbol, registers):
+        if symbol not in self.code:
+            raise Stopped(f"the image has no {symbol}")
         self.cycles = self.after = self.depth = self.stack = 0
-        for number, value in enumerate(arguments):
+        self.why = None
+        for number, value in enumerate(registers):
             self.uc.reg_write(arm.UC_ARM_REG_R0 + number, value & 0xFFFFFFFF)
         self.uc.reg_write(arm.UC_ARM_REG_SP, STACK_TOP)
         self.uc.reg_write(arm.UC_ARM_REG_LR, RETURN | 1)
         try:
-            self.uc.emu_start(self.functions[name], RETURN, count=0)
+            self.uc.emu_start(self.code[symbol][0] | 1, RETURN)
         except unicorn.UcError as error:
-            raise RuntimeError(f"{name}({arguments}): {error}") from error
+            raise Stopped(self.why or str(error)) from None
         if self.uc.reg_read(arm.UC_ARM_REG_PC) != RETURN:
-            raise RuntimeError(f"{name}({arguments}): does not return")
+            raise Stopped(f"does not return within {ENDLESS} cycles")
         self.result = self.uc.reg_read(arm.UC_ARM_REG_R0)
+
+    def contents(self):
+        """What the strings and buffers that were given hold now."""
+        return [bytes(self.uc.mem_read(place, size)) for place, size in self.buffers]

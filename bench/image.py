@@ -73,7 +73,7 @@ def segments(elf):
     for segment in elf.iter_segments():
         size = segment["p_memsz"]
         if segment["p_type"] == "PT_LOAD" and size > 0:
-            if size > LARGEST:
+            if size > LARGEST or segment["p_vaddr"] + size > 1 << 32:
                 raise BadImage(f"a segment of {size} bytes is more than a Cortex-M0 has")
             data = segment.data()
             if len(data) != segment["p_filesz"] or len(data) > size:

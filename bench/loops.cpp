@@ -1,5 +1,5 @@
-// The obvious loop for each function: what a firmware engineer writes in a minute, without tests
-// for null and with no bounds but its own. Built at -Os, -O2 and -O3.
+// The naive loop for each function: what a firmware engineer writes in a minute, without tests for
+// null and with no bounds but its own. Built at -O0, -Os, -O2 and -O3.
 #include "base_types.h"
 
 template <typename Unit>
@@ -118,6 +118,7 @@ struct Loops {
     while (str[from] != 0 && StrChr(set, str[from])) from++;
     int to = StrLen(str);
     while (to > from && StrChr(set, str[to - 1])) to--;
+    str[to] = 0;
     int n = 0;
     while (from < to) str[n++] = str[from++];
     str[n] = 0;

@@ -1,4 +1,6 @@
 /* What a C library has no single function for, put together from those that it has. */
+#define _GNU_SOURCE
+#include <stdlib.h>
 #include <string.h>
 
 #if defined(__PICOLIBC_VERSION__)
@@ -17,11 +19,11 @@ int peer_split(char* str, const char* dlmt, char** wrd) {
 }
 
 int peer_trim(char* str, const char* set) {
-  const char* const first = str + strspn(str, set);
+  char* const first = str + strspn(str, set);
   size_t kept = strlen(first);
   while (kept > 0 && strchr(set, first[kept - 1])) kept--;
-  memmove(str, first, kept);
-  str[kept] = 0;
+  first[kept] = 0;
+  memmove(str, first, kept + 1);
   return (int)kept;
 }
 
@@ -38,3 +40,14 @@ int peer_replace(const char* orig, const char* rep, const char* with, char* resu
   strcpy(out, orig);
   return (int)(out - result) + (int)strlen(out);
 }
+
+// The linker keeps what this names and drops all else.
+void (*const peers[])(void) = {
+    (void (*)(void))strlen,      (void (*)(void))strupr,     (void (*)(void))strlwr,
+    (void (*)(void))strcpy,      (void (*)(void))strlcpy,    (void (*)(void))strncpy,
+    (void (*)(void))strcat,      (void (*)(void))strlcat,    (void (*)(void))strchr,
+    (void (*)(void))strstr,      (void (*)(void))strcasestr, (void (*)(void))strncmp,
+    (void (*)(void))strncasecmp, (void (*)(void))strcmp,     (void (*)(void))strcasecmp,
+    (void (*)(void))strtok_r,    (void (*)(void))itoa,       (void (*)(void))atoi,
+    (void (*)(void))peer_split,  (void (*)(void))peer_trim,  (void (*)(void))peer_replace,
+};

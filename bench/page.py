@@ -1,0 +1,183 @@
+"""Writes the performance page, its chart and README.md's figures, from the costs and what is measured."""
+import math
+import re
+from string import Template
+
+import costs
+from calls import DIGIT_SIZES, FUNCTIONS, SIZES
+
+TITLES = {**costs.BUILDS, "gcc-O3": "GCC -O3", "gcc-O0": "GCC -O0", "clang-O0": "Clang -O0",
+          "newlib": "newlib", "picolibc-small": "picolibc, small", "picolibc": "picolibc, fast"}
+BUILDS = "gcc-O2", "clang-O2", "gcc-Os"  # that the tables of cycles have
+LOOPS = "loops-Os", "loops-O2", "loops-O3"
+README = re.compile(r"(<!-- figures: .* -->\n).*?(<!-- end of figures -->)", re.S)
+
+
+def table(heads, lines):
+    rule = ["---"] + ["--:"] * (len(heads) - 1)
+    return "".join(f"| {' | '.join(map(str, line))} |\n" for line in [heads, rule, *lines])
+
+
+def names(function):
+    return function.title(" ".join(f"`{name}`" for name in function.names()))
+
+
+def label(function, case):
+    return f"`{function.name}`" + (f", {case.about}" if case.about else "")
+
+
+def build_table(measured):
+    heads = ["Build", "one function", "all 50", "stack", "cycles beside C libraries", "without over-reads",
+             "beside naive loops"]
+    lines = []
+    for name, build in measured.builds.items():
+        ratios = (measured.beside_libraries(name), measured.beside_exact_libraries(name),
+                  measured.beside_loops(name))
+        lines.append([TITLES[name], f"{build.alone:.0f}", f"{build.bytes:,}", build.stack,
+                      *(f"{ratio.mean:.2f} ({ratio.slower} of {ratio.cases} slower)" for ratio in ratios)])
+    return table(heads, lines)
+
+
+def cases(sizes):
+    """Those that have numbers of digits as their sizes, or those that have not."""
+    return [(function, case) for function in FUNCTIONS for case in function.cases
+            if (case.sizes == DIGIT_SIZES) == (sizes == DIGIT_SIZES)]
+
+
+def cycle_table(measured, sizes):
+    """Ours, of word-aligned strings."""
+    heads = ["Function"] + [f"{TITLES[build]}: {n}" if n == sizes[0] else n for build in BUILDS for n in sizes]
+    return table(heads, [[label(function, case)] + [
+        measured.cycles.get((build, function.name, case.about, n, False), "") for build in BUILDS for n in sizes]
+        for function, case in cases(sizes)])
+
+
+def size_table(stated):
+    heads = ["Function"] + [f"{title}: bytes, stack" for title in costs.BUILDS.values()]
+    return table(heads, [[names(function)] + [
+        f"{stated[build, function.title(function.name)].bytes}, {stated[build, function.title(function.name)].stack}"
+        for build in costs.BUILDS] for function in FUNCTIONS])
+
+
+def bound_tables(stated):
+    return "\n".join(table(["Function", f"{title}: cycles, at most"], [
+        [names(function), stated[build, function.title(function.name)].formula()] for function in FUNCTIONS])
+        for build, title in costs.BUILDS.items())
+
+
+def images_of(other):
+    return LOOPS if other == "loop" else (other,)
+
+
+def comparison_table(measured, sizes, shown):
+    """GCC -O2 beside the others, in the sizes that are shown."""
+    others = ["gcc-O2", *measured.libraries, "loop"]
+    titles = {"gcc-O2": "strutil", "loop": "naive loop"}
+    heads = ["Function"] + [f"{titles.get(other) or TITLES[other]}, {n}" for n in shown for other in others]
+    return table(heads, [[label(function, case)] + [
+        comparison_cell(measured, other, function, case, n) for n in shown for other in others]
+        for function, case in cases(sizes)])
+
+
+def comparison_cell(measured, other, function, case, n):
+    """Word-aligned and, if that differs, not."""
+    if n not in case.sizes:
+        return ""
+    cycles = [measured.fastest(images_of(other), function.name, case.about, n, misaligned)
+              for misaligned in (False, True)]
+    if cycles[0] is None:
+        return "no equivalent"
+    mark = "†" if (other, function.name) in measured.over_reads else ""
+    return " / ".join(f"{one}{mark}" for one in dict.fromkeys(cycles))
+
+
+def readme_table(measured, promised):
+    """The promised stack, which holds for other versions of the compilers as well."""
+    heads = ["Build", "one function", "all 50", "static RAM", "stack", "cycles beside C libraries", "beside loops"]
+    levels = {"gcc-O2": "GCC `-O2`, also `-Og`, `-O1`", "clang-O2": "Clang `-O2`", "gcc-Os": "GCC `-Os`",
+              "clang-Os": "Clang `-Os`", "gcc-O0": "GCC `-O0`"}
+    return table(heads, [[
+        level, f"{measured.builds[build].alone:.0f} bytes", f"{measured.builds[build].bytes:,} bytes", 0,
+        f"{promised[build]} bytes", f"{measured.beside_exact_libraries(build).mean:.2f}",
+        f"{measured.beside_loops(build).mean:.2f}"] for build, level in levels.items()])
+
+
+def wide_extra(measured):
+    """By how many percent a wide function is slower than its narrow one, at most."""
+    return max(math.ceil(100 * measured.cycles[build, function.wide, case.about, n, False]
+                         / measured.cycles[build, function.name, case.about, n, False] - 100)
+               for build in BUILDS for function in FUNCTIONS if function.wide
+               for case in function.cases for n in case.sizes)
+
+
+def make(source, stated, measured, versions, promised):
+    """The files that this writes: their new contents, by name."""
+    example = stated["gcc-O2", "StrCmp"]
+    page = Template((source / "bench/page.md").read_text()).substitute(
+        versions=", ".join(versions),
+        example=example.formula().replace(" n", " x 16") + f" = {example.of({'n': 16}):g}",
+        example_cycles=measured.cycles["gcc-O2", "StrCmp", "equal", 16, False],
+        wide_extra=wide_extra(measured),
+        build_table=build_table(measured),
+        cycle_table=cycle_table(measured, SIZES),
+        digit_table=cycle_table(measured, DIGIT_SIZES),
+        size_table=size_table(stated),
+        bound_tables=bound_tables(stated),
+        comparison_table=comparison_table(measured, SIZES, (16, 256)),
+        digit_comparison=comparison_table(measured, DIGIT_SIZES, (4, 10)))
+    readme, count = README.subn(lambda found: found[1] + readme_table(measured, promised) + found[2],
+                                (source / "README.md").read_text())
+    if count != 1:
+        raise SystemExit("README.md: the lines <!-- figures: ... --> and <!-- end of figures --> are not there once")
+    return {"docs/performance.md": page, "docs/performance.svg": chart(measured), "README.md": readme}
+
+
+# The chart is written directly, for light and for dark pages.
+SHOWN = [("StrLen", ""), ("StrCopy", ""), ("StrCopyBuf", ""), ("StrCat", ""), ("StrChr", "not found"),
+         ("StrCmp", "equal"), ("StrICmp", "same case"), ("StrUpper", "mixed case"),
+         ("StrStr", "found late"), ("StrIStr", "found late"), ("StrToken", "all tokens"),
+         ("StrReplace", "one unit by two")]
+SERIES = [("gcc-O2", "strutil", "#2f81c1"), ("newlib", "newlib", "#d9822b"),
+          ("picolibc", "picolibc, built for speed", "#5a9e6f"), ("loop", "naive loop", "#999999")]
+UNITS = 256
+AXIS_MAX = 50  # cycles per unit; a longer bar is broken
+LEFT, SCALE, BAR, GAP = 200, 7.5, 9, 7  # pixels: of the bars' beginning, a cycle, a bar and between groups
+
+
+def bar(y, cycles, fill):
+    """A bar with its number, broken by a slanted gap if it is too long."""
+    length = min(cycles, AXIS_MAX) * SCALE
+    lines = [f'<rect x="{LEFT}" y="{y}" width="{length:.1f}" height="{BAR - 1}" {fill}/>']
+    if cycles > AXIS_MAX:
+        x = LEFT + length - 24
+        lines.append(f'<path d="M{x} {y + BAR} l5 -{BAR + 1} h5 l-5 {BAR + 1} z" class="page"/>')
+    lines.append(f'<text x="{LEFT + length + 4:.1f}" y="{y + BAR - 1}" font-size="10">{cycles:.1f}</text>')
+    return lines
+
+
+def chart(measured):
+    lines, y = [], 62
+    for name, about in SHOWN:
+        shown = f"{name}, {about}" if about else name
+        lines.append(f'<text x="{LEFT - 8}" y="{y + 2 * BAR + 2}" text-anchor="end">{shown}</text>')
+        for image, _, color in SERIES:
+            cycles = measured.fastest(images_of(image), name, about, UNITS, False)
+            if cycles is not None:
+                is_hollow = (image, name) in measured.over_reads
+                fill = f'fill="none" stroke="{color}"' if is_hollow else f'fill="{color}"'
+                lines += bar(y, cycles / UNITS, fill)
+            y += BAR
+        y += GAP
+    x = LEFT
+    for _, name, color in SERIES:
+        lines.append(f'<rect x="{x}" y="28" width="10" height="10" fill="{color}"/>'
+                     f'<text x="{x + 14}" y="37">{name}</text>')
+        x += 30 + 6 * len(name)
+    size = f'width="640" height="{y}" viewBox="0 0 640 {y}"'
+    return f"""<svg xmlns="http://www.w3.org/2000/svg" {size} font-family="sans-serif" font-size="12">
+<style>text {{ fill: #1f2328 }} .page {{ fill: #fff }}
+@media (prefers-color-scheme: dark) {{ text {{ fill: #e6edf3 }} .page {{ fill: #0d1117 }} }}</style>
+<rect width="640" height="{y}" class="page"/>
+<text x="320" y="16" text-anchor="middle" font-size="14">Cycles per unit, strings of {UNITS} units: lower is better</text>
+<text x="{LEFT}" y="54" font-size="11">hollow: reads past the end of the string</text>
+""" + "\n".join(lines) + "\n</svg>\n"
