@@ -23,11 +23,23 @@ class Array:
 
 class Call:
     """What a call may do: when it may read a unit and when it writes one, by addresses; `cells` are the units
-    as they are by then, `needs` what the caller has to see to."""
+    as they are by then, `needs` what the caller has to see to. `lengths` are those that its upper bound in
+    cycles depends on."""
 
-    def __init__(self, arrays):
+    def __init__(self, arrays, divide=None):
         self.cells = {array.place(index): unit for array in arrays for index, unit in enumerate(array.units)}
-        self.readable, self.written, self.needs = {}, {}, []
+        self.readable, self.written, self.needs, self.divide = {}, {}, [], divide
+        self.lengths = {"n": 0, "d": 0, "m": 1, "w": 0, "r": 0}
+
+    def decided(self, condition):
+        """Whether a condition holds, for all that the caller may pass or for none of it."""
+        if isinstance(condition, bool):
+            return condition
+        solver = z3.Solver()
+        solver.add(*self.needs)
+        can_hold = solver.check(condition) == z3.sat
+        assert not can_hold or solver.check(Not(condition)) == z3.unsat, condition
+        return can_hold
 
     def unit(self, array, index):
         return self.cells[array.place(index)]
@@ -131,6 +143,7 @@ def str_len(call, str):
     if not str:
         return 0
     call.reads(str)
+    call.lengths["n"] = length(str)
     return length(str)
 
 
@@ -147,6 +160,7 @@ def map_case(mapped):
         if not str:
             return 0
         call.reads(str)
+        call.lengths["n"] = length(str)
         for index, when in enumerate(before_end(str)):
             unit = str.units[index]
             call.write(str, index, mapped(unit), And(when, mapped(unit) != unit))
@@ -158,6 +172,7 @@ def map_case(mapped):
 
 def copy_units(call, dst, src, last):
     """Copies forward up to the index `last`, which gets the terminator."""
+    call.lengths["n"] = If(last < 0, 0, last)
     for index in range(len(src)):
         unit = call.unit(src, index)
         call.write(dst, index, If(index == last, 0, unit), index <= last)
@@ -192,6 +207,7 @@ def str_n_copy(call, dst, src, n):
         return call.write(dst, 0, 0)
     call.reads(src, n)
     ends = counted_length(call, src, n)
+    call.lengths["n"] = If(ends < 0, 0, ends)
     call.write(dst, 0, 0, n < 1)
     for index in range(len(src)):
         call.write(dst, index, call.unit(src, index), And(index <= ends, index < n))
@@ -208,6 +224,7 @@ def counted_length(call, text, count):
 def append(call, dst, src, count):
     """Appends so many units and the terminator; none of it where the count is negative."""
     old = length(dst)
+    call.lengths.update(d=old, n=If(count < 0, 0, count))
     for end in range(len(dst)):
         for index in range(min(len(src) + 1, len(dst) - end)):
             unit = src.units[index] if index < len(src) else 0
@@ -261,6 +278,7 @@ def str_chr(call, str, c):
     for index, when in reversed(list(enumerate(before_end(str)))):
         unit = str.units[index]
         found = If(And(when, unit != 0, unit == c), str.place(index), found)
+    call.lengths["n"] = first(str, lambda index: Or(str.units[index] == 0, str.units[index] == c))
     return found
 
 
@@ -270,10 +288,13 @@ def find(mapped):
             return 0
         call.reads(str)
         call.reads(substr)
-        found = 0
+        found, walked = 0, 0
         for index in reversed(range(len(str))):
+            is_end = str.units[index] == 0
             matches = begins_with(str.units[index:], substr, mapped)
-            found = If(str.units[index] == 0, 0, If(matches, str.place(index), found))
+            found = If(is_end, 0, If(matches, str.place(index), found))
+            walked = If(is_end, index, If(matches, index + length(substr), walked))
+        call.lengths.update(n=walked, m=length(substr))
         return found
     return contract
 
@@ -289,11 +310,13 @@ def compare(mapped=lambda unit: unit, ordered=True):
         for text in (str1, str2):
             call.reads(text, n)
             counted_length(call, text, n)
-        result = 0
+        result, walked = 0, min(len(str1), len(str2))
         for index in reversed(range(min(len(str1), len(str2)))):
             a, b = mapped(str1.units[index]), mapped(str2.units[index])
             place = If(a < b, -(index + 1), index + 1) if ordered else -(index + 1)
             result = If(index >= n, 0, If(a != b, place, If(a == 0, 0, result)))
+            walked = If(Or(index >= n, a != b, a == 0), index, walked)
+        call.lengths["n"] = walked
         return result
     return contract
 
@@ -314,7 +337,9 @@ def str_token(call, str, off, dlmt):
     is_cut = Or(*(And(end == index, delimits[index]) for index in range(len(rest))))
     for index in range(len(rest)):
         call.write(rest, index, 0, And(end == index, delimits[index]))
-    call.write(off, 0, off.units[0] + end + If(is_cut, 1, 0))
+    walked = end + If(is_cut, 1, 0)
+    call.write(off, 0, off.units[0] + walked)
+    call.lengths.update(n=walked, m=length(dlmt))
     return If(end == start, 0, rest.address + rest.size * start)
 
 
@@ -323,6 +348,7 @@ def str_split(call, str, dlmt, wrd):
         return 0
     call.reads(str)
     call.reads(dlmt)
+    call.lengths.update(n=length(str), m=length(dlmt))
     number, in_token = 0, False
     for index, when in enumerate(before_end(str)):
         unit = str.units[index]
@@ -341,6 +367,7 @@ def str_trim(call, str, trimSet):
     if not str:
         return 0
     call.reads(str)
+    call.lengths.update(n=length(str), m=length(trimSet))
     kept = [True] * len(str)
     if trimSet:
         call.reads(trimSet)
@@ -380,6 +407,8 @@ def str_replace(call, orig, rep, with_, result):
                     call.write(result, at, unit, And(begins, is_unit, unit != 0, size + number == at))
         size = size + If(begins, length(with_), If(is_free, 1, 0))
         passed = If(begins, length(rep) - 1, If(passed == 0, 0, passed - 1))
+    call.lengths = {"n": If(is_real, length(orig), 0), "m": If(is_real, length(rep), 1), "d": 0,
+                    "w": length(with_), "r": size}
     if result and result.address != orig.address:
         for at in range(len(result)):
             call.write(result, at, 0, And(is_real, size == at))
@@ -388,58 +417,59 @@ def str_replace(call, orig, rep, with_, result):
 
 # Integer text conversion
 
-def int_to_str(divide):
-    """`divide` gives the quotient and the remainder of two numbers, the first one not negative."""
-    def contract(call, value, string, radix):
-        if not string:
-            return 0
-        if radix < 1 or radix == 1:
-            is_zero = And(radix == 1, value == 0)
-            call.write(string, 0, If(is_zero, ord("0"), 0))
-            call.write(string, 1, 0, is_zero)
-            return string.address
-        is_negative = value < 0
-        rest = If(is_negative, -value, value)
-        digits, is_digit = [], [True]
+def int_to_str(call, value, string, radix):
+    """The radix is a number; whether the value is negative has to be the same for all values that it is."""
+    if not string:
+        return 0
+    is_negative = call.decided(value < 0)
+    rest, digits = -value if is_negative else value, []
+    if radix > 1:
         for _ in range(len(string) - 2):
-            rest, digit = divide(rest, radix)
+            rest, digit = call.divide(rest, radix)
             unit = If(digit < 10, 48 + digit, 87 + digit)
-            digits.append(unit & (0xFF if string.size == 1 else 0xFFFF))
-            is_digit.append(And(is_digit[-1], rest != 0))
-            if is_digit[-1] is False:
-                break
-        for size in range(1, len(digits) + 1):
-            is_size = And(is_digit[size - 1], Not(is_digit[size]))
-            units = list(reversed(digits[:size])) + [0]
-            for index in range(size + 2):
-                with_sign = ord("-") if index == 0 else units[index - 1]
-                when = And(is_size, True if index <= size else is_negative)
-                plain = units[index] if index <= size else 0
-                call.write(string, index, If(is_negative, with_sign, plain), when)
-        return string.address
-    return contract
+            digits.append((unit & (0xFF if string.size == 1 else 0xFFFF), rest != 0))
+    elif radix == 1:
+        digits = [(48, False)] if call.decided(value == 0) else []
+    write_number(call, string, digits, is_negative)
+    return string.address
+
+
+def write_number(call, string, digits, is_negative):
+    """The last digit comes first, each with whether another follows."""
+    is_size, sign = True, [ord("-")] if is_negative else []
+    if not digits:
+        return call.write(string, 0, 0)
+    for size in range(1, len(digits) + 1):
+        units = sign + [unit for unit, _ in reversed(digits[:size])] + [0]
+        goes_on = digits[size - 1][1]
+        for index, unit in enumerate(units):
+            call.write(string, index, unit, And(is_size, Not(goes_on)))
+        is_size = And(is_size, goes_on)
+    call.needs.append(Not(is_size))
 
 
 def str_to_int(call, string):
     if not string:
         return 0
-    units = string.units
 
-    def number(index, value):
-        unit = units[index]
-        if isinstance(unit, int) and unit == 0:
-            return value
-        return If(And(unit >= 48, unit <= 57), number(index + 1, value * 10 + (unit - 48)), value)
-
-    def signed(index):
-        return If(units[index] == ord("-"), -number(index + 1, 0) if index + 1 < len(units) else 0,
-                  number(index, 0))
+    def digits(index, value):
+        """The value and where reading ends."""
+        unit = string.units[index]
+        if index == len(string) - 1:
+            return value, index
+        more, end = digits(index + 1, value * 10 + (unit - 48))
+        is_digit = And(unit >= 48, unit <= 57)
+        return If(is_digit, more, value), If(is_digit, end, index)
 
     call.reads(string)
-    result = 0
-    for index in reversed(range(len(units))):
-        is_blank = Or(units[index] == 32, units[index] == 9)
-        result = If(is_blank, result, signed(index))
+    result, walked = 0, len(string) - 1
+    for index in reversed(range(len(string) - 1)):
+        unit = string.units[index]
+        positive, negative = digits(index, 0), digits(index + 1, 0)
+        is_minus, is_blank = unit == ord("-"), Or(unit == 32, unit == 9)
+        result = If(is_blank, result, If(is_minus, -negative[0], positive[0]))
+        walked = If(is_blank, walked, If(is_minus, negative[1], positive[1]))
+    call.lengths["n"] = walked
     return result
 
 
@@ -449,6 +479,7 @@ def to_words(call, src, des, len):
     if not src or not des:
         return
     call.needs.append(len <= min(src.__len__(), des.__len__()))
+    call.lengths["n"] = If(len < 0, 0, len)
     for index in range(min(src.__len__(), des.__len__())):
         call.may_read(src, index, index < len)
         call.write(des, index, call.unit(src, index), index < len)
@@ -472,11 +503,12 @@ def w_str_to_str(call, src, des, bufsize):
         call.write(des, 0, 0)
         return des.address
     call.reads(src)
-    size, fits = 0, True
+    size, fits, walked = 0, True, 0
     for unit, when in zip(src.units, before_end(src)):
         is_plain = And(unit >= 32, unit <= 126)
         digits = If(unit < 0x10, 1, If(unit < 0x100, 2, If(unit < 0x1000, 3, 4)))
         wanted = If(is_plain, 1, digits + 5)
+        walked = walked + If(And(fits, when, unit != 0), 1, 0)
         fits = And(fits, when, unit != 0, size + wanted < bufsize)
         for at in range(des.__len__()):
             number = at - size
@@ -486,6 +518,7 @@ def w_str_to_str(call, src, des, bufsize):
                 number == 3, ord("x"), If(digit == digits, ord(")"), nibble + If(nibble < 10, 48, 87))))))
             call.write(des, at, If(is_plain, unit, escape), And(fits, at >= size, at < size + wanted))
         size = size + If(fits, wanted, 0)
+    call.lengths["n"] = walked
     for at in range(des.__len__()):
         call.write(des, at, 0, size == at)
     return des.address
@@ -523,6 +556,7 @@ FUNCTIONS = {
     "StrSplit": (str_split, "str:text dlmt:pattern wrd:pointers"),
     "StrTrim": (str_trim, "str:text trimSet:pattern"),
     "StrReplace": (str_replace, "orig:text rep:pattern with:with result:out"),
+    "IntToStr": (int_to_str, "value:int string:out radix:int"),
     "StrToInt": (str_to_int, "string:text"),
     "BytesToWords": (to_words, "src:words des:words len:int"),
     "WStrToWords": (to_words, "src:words des:words len:int"),

@@ -11,6 +11,7 @@ MASK = 0xFFFFFFFF
 SP, LR, PC = 13, 14, 15
 RETURN = 0xFFFFFFF0  # where the caller of the function is
 STACK_TOP, STACK_SIZE = 0x20008000, 256
+STEP_LIMIT = 1000000
 KEPT = (4, 5, 6, 7, 8, 9, 10, 11, SP)
 CHECK_LIMIT = 60000  # milliseconds for one question to the solver
 
@@ -31,8 +32,8 @@ class StillNeeded(Exception):
     """A register was taken for one that is not read again, at a place where states meet."""
 
 
-class Reads(Exception):
-    """A state is about to read a unit, before which others may meet it."""
+class Pause(Exception):
+    """A state is about to load a unit, and waits for others that may meet it."""
 
 
 class Dropped:
@@ -59,9 +60,11 @@ def simple(value):
 
 
 def is_same(a, b):
-    if isinstance(a, z3.AstRef) and isinstance(b, z3.AstRef):
-        return a.eq(b)
-    return a is b or (is_number(a) and is_number(b) and a == b)
+    if a is b:
+        return True
+    if isinstance(a, z3.AstRef):
+        return isinstance(b, z3.AstRef) and a.eq(b)
+    return is_number(a) and is_number(b) and a == b
 
 
 def signed(number):
@@ -239,10 +242,6 @@ class Memory:
                 return int.from_bytes(data[address - start:address - start + size], "little")
         return None
 
-    def is_new(self, address):
-        return is_number(address) and address in self.sizes and address < STACK_TOP - STACK_SIZE \
-            and address not in self.read and address not in self.written
-
     def load(self, address, size):
         if is_number(address) and address not in self.sizes and address % size == 0:
             constant = self.constant(address, size)
@@ -278,13 +277,13 @@ class State:
 
     def __init__(self, registers, memory, path):
         self.r, self.memory, self.path = registers, memory, path
-        self.cycles, self.lowest, self.resumed = 0, STACK_TOP, False
-        self.facts, self.is_checked, self.is_paused, self.reads_new, self.loads = {}, False, False, False, 0
+        self.cycles, self.lowest, self.loads, self.facts = 0, STACK_TOP, 0, {}
+        self.paused, self.is_checked = False, False
 
     def copy(self):
         other = State(list(self.r), self.memory.copy(), self.path)
-        other.loads = self.loads
-        other.cycles, other.lowest, other.facts = self.cycles, self.lowest, dict(self.facts)
+        other.cycles, other.lowest, other.loads = self.cycles, self.lowest, self.loads
+        other.facts = dict(self.facts)
         return other
 
     def get(self, register):
@@ -296,10 +295,14 @@ class State:
     def load(self, address, size):
         self.check_stack(address)
         if is_number(address) and address in self.memory.paced:
-            if not self.resumed:
-                raise Reads(self.memory.is_new(address))
-            self.loads += 1
+            self.pause()
         return self.memory.load(address, size)
+
+    def pause(self):
+        """Stops before a load, once, so that others can meet this state."""
+        if not self.paused:
+            raise Pause
+        self.loads += 1
 
     def store(self, address, size, value):
         self.check_stack(address)
@@ -623,75 +626,82 @@ def decode(op):
 
 
 class Machine:
-    """An image whose functions run from symbolic arguments. `needed` is learned: at which place which
+    """An image whose functions run from arguments that are any. `needed` is learned: at which place which
     registers are read again, so that states that differ in one of them stay apart."""
 
     def __init__(self, segments, division=None):
-        self.segments, self.division = segments, division
+        self.segments, self.division, self.division_of = segments, division, Division()
         self.needed, self.decoded = {}, {}
-        self.checks = self.restarts = self.steps = 0
 
     def fetch(self, pc):
         if pc not in self.decoded:
             op = Memory.constant(self, pc, 2)
             if op is None:
-                raise Broken(f"a jump to {pc:#x}, where the image has nothing")
+                raise Broken(f"jumps to {pc:#x}, where the image has nothing")
             if op >> 11 > 0x1C:
                 op = op << 16 | Memory.constant(self, pc + 2, 2)
             self.decoded[pc] = op, None if is_conditional(op) else decode(op)
         return self.decoded[pc]
 
-    def run(self, pc, arguments, memory, conditions):
+    def run(self, pc, arguments, memory, conditions, has_result):
         """All states in which a call ends. `conditions` hold of the arguments and the contents."""
+        registers = [*arguments, *(0xDEAD0000 + 4 * n for n in range(len(arguments), 13))]
+        registers += [STACK_TOP, RETURN | 1, pc, Flags(0)]
+        self.needed[RETURN] = {0, *KEPT} if has_result else set(KEPT)
         while True:
             self.solver = z3.SimpleSolver()
             self.solver.set("timeout", CHECK_LIMIT)
-            self.solver.add(*conditions)
-            self.numbers, self.kept = count(), []
-            registers = list(arguments) + [0xDEAD0000 + 4 * n for n in range(len(arguments), 13)]
-            registers += [STACK_TOP, RETURN | 1, pc, Flags(0)]
-            start = State(registers, memory.copy(), z3.BoolVal(True))
+            self.solver.add(*conditions, *self.division_of.promises)
+            self.numbers, self.kept, self.steps = count(), [], 0
             try:
-                return self.explore(start)
+                ended = self.explore(State(list(registers), memory.copy(), z3.BoolVal(True)))
             except StillNeeded as place:
-                self.restarts += 1
                 self.needed.setdefault(place.args[0], set()).add(place.args[1])
+                continue
+            if not ended:
+                raise GivenUp("no path ends")
+            for state in ended:
+                for register in KEPT:
+                    if state.r[register] != registers[register]:
+                        raise Broken(f"r{register} is not kept", state)
+            return ended
 
-    def example(self, *conditions):
-        """Contents for which all conditions hold, or None."""
-        self.checks += 1
-        found = self.solver.check(*conditions)
+    def is_possible(self, condition):
+        found = self.solver.check(condition)
         if found == z3.unknown:
             raise GivenUp(f"the solver gives up: {self.solver.reason_unknown()}")
-        return self.solver.model() if found == z3.sat else None
+        return found == z3.sat
 
     def named(self, condition):
         """A new variable that implies a condition."""
-        name = z3.Bool(f"path{next(self.numbers)}")
+        name = z3.Bool(f"path {next(self.numbers)}")
         self.solver.add(z3.Implies(name, condition))
         return name
 
     def explore(self, start):
-        """Runs waiting states, first those that have read the fewest units, so that states meet."""
+        """Runs waiting states, first those that have loaded the fewest units, so that others meet them. A
+        path is checked to be possible where it is about to load: most branches can go both ways."""
         self.queue, self.waiting, ended = [], {}, []
         self.wait(start)
         while self.queue:
             state = self.waiting.pop(heapq.heappop(self.queue)[-1])
-            if state.is_paused and state.reads_new and not state.is_checked and self.example(state.path) is None:
-                continue
-            state.is_checked, state.resumed, state.is_paused = state.is_paused, state.is_paused, False
+            if state.paused and not state.is_checked:
+                if not self.is_possible(state.path):
+                    continue
+                state.is_checked = True
             try:
                 self.advance(state, ended)
             except Broken as broken:
-                if self.example(state.path) is not None:
+                if self.is_possible(state.path):
                     broken.state = state
                     raise
-        return [state for state in ended if self.example(state.path) is not None]
+        return [state for state in ended if self.is_possible(state.path)]
 
     def wait(self, state):
+        """Puts a state among the waiting, or merges it into one that is at the same place with the same
+        values in the registers that matter and on the stack."""
         pc = state.r[PC]
-        needed = self.needed.get(pc, ())
-        key = (pc, state.r[SP], tuple(identity(state.r[register]) for register in needed),
+        key = (pc, state.r[SP], tuple(identity(state.r[register]) for register in self.needed.get(pc, ())),
                tuple(identity(state.memory.cells[cell]) for cell in range(state.r[SP], STACK_TOP, 4)))
         if key in self.waiting:
             self.merge(self.waiting[key], state)
@@ -713,76 +723,117 @@ class Machine:
                     ours[cell] = z3.If(one.path, a, b)
         one.path = self.named(z3.Or(one.path, other.path))
         one.facts = {number: holds for number, holds in one.facts.items() if other.facts.get(number) == holds}
-        one.is_checked = one.is_checked or other.is_checked
-        one.is_paused = one.is_paused or other.is_paused
-        one.cycles = max(one.cycles, other.cycles)
-        one.lowest = min(one.lowest, other.lowest)
+        one.paused, one.is_checked = one.paused and other.paused, one.is_checked or other.is_checked
+        one.cycles, one.lowest = max(one.cycles, other.cycles), min(one.lowest, other.lowest)
 
     def advance(self, s, ended):
         """Runs a state until it ends, or has to wait."""
-        while True:
-            pc = s.r[PC]
-            if pc == RETURN & ~1:
-                for register in (0, *KEPT):
-                    s.get(register)
-                s.is_checked = False
-                ended.append(s)
-                return
-            op, row = self.fetch(pc)
+        while s.r[PC] != RETURN:
             self.steps += 1
-            if row is None:
-                s.r[PC] = pc + 2
-                if self.branch(s, op):
-                    return
-                continue
-            s.r[PC] = pc + (4 if op > 0xFFFF else 2)
+            if self.steps > STEP_LIMIT:
+                raise GivenUp(f"more than {STEP_LIMIT} steps")
+            pc = s.r[PC]
             try:
-                row[4](s, op)
-            except Reads as reads:
-                s.r[PC], s.is_paused, s.reads_new = pc, True, reads.args[0]
+                if pc == self.division:
+                    self.divide(s)
+                else:
+                    op, row = self.fetch(pc)
+                    s.r[PC] = pc + (4 if op > 0xFFFF else 2)
+                    if row is None:
+                        if self.branch(s, op):
+                            return
+                        continue
+                    row[4](s, op)
+                    s.cycles += row[3]
+                s.paused = False
+            except Pause:
+                s.r[PC], s.paused = pc, True
                 return self.wait(s)
-            s.cycles += row[3]
-            s.resumed = False
+        for register in self.needed[RETURN]:
+            s.get(register)
+        ended.append(s)
+
+    def divide(self, s):
+        """The runtime's division by its contract: quotient and remainder, and all other registers that a
+        call may change are any. Its own cycles and stack are not counted."""
+        s.pause()
+        dividend, divisor = s.get(0), s.get(1)
+        if not is_number(divisor) or not 0 < signed(divisor):
+            raise GivenUp(f"a division by {divisor}")
+        if not is_number(dividend) and self.is_possible(z3.And(s.path, dividend < 0)):
+            raise GivenUp("a division of a negative number that is none in particular")
+        known = len(self.division_of.promises)
+        quotient, remainder = self.division_of(dividend, divisor)
+        self.solver.add(*self.division_of.promises[known:])
+        s.r[0], s.r[1] = quotient, remainder
+        for register in (2, 3, 12):
+            s.r[register] = z3.BitVec(f"r{register} after division {next(self.numbers)}", 32)
+        s.r[FLAGS] = Dropped(RETURN, FLAGS)
+        s.jump(s.get(LR))
 
     def branch(self, s, op):
         """A conditional branch: whether it goes both ways, and both states wait."""
         taken = s.get(FLAGS).has(op >> 8 & 15)
-        s.cycles += 1
         if not isinstance(taken, bool):
-            taken = self.decided(s, z3.simplify(taken))
+            taken = decided(s, z3.simplify(taken))
+        s.cycles += 1
         if isinstance(taken, bool):
-            self.go(s, op, taken)
+            go(s, op, taken)
             return False
         other = s.copy()
         for state, is_taken in ((s, True), (other, False)):
             self.assume(state, taken, is_taken)
-            self.go(state, op, is_taken)
+            go(state, op, is_taken)
             self.wait(state)
         return True
 
-    def go(self, s, op, is_taken):
-        if is_taken:
-            s.r[PC] += 2 + ((op & 0xFF ^ 0x80) - 0x80) * 2
-            s.cycles += 1
-
-    def decided(self, s, condition):
-        """What earlier branches of the same path say of a condition, or itself."""
-        if z3.is_true(condition) or z3.is_false(condition):
-            return z3.is_true(condition)
-        if z3.is_not(condition):
-            found = s.facts.get(condition.arg(0).get_id())
-            return condition if found is None else not found
-        found = s.facts.get(condition.get_id())
-        return condition if found is None else found
-
     def assume(self, s, condition, holds):
-        s.path = self.named(z3.And(s.path, condition if holds else z3.Not(condition)))
+        s.path, s.is_checked = self.named(z3.And(s.path, condition if holds else z3.Not(condition))), False
         if z3.is_not(condition):
             condition, holds = condition.arg(0), not holds
         self.kept.append(condition)  # so that no other term gets its number
         s.facts[condition.get_id()] = holds
-        s.is_checked = False
+
+
+def go(s, op, is_taken):
+    if is_taken:
+        s.r[PC] += 2 + ((op & 0xFF ^ 0x80) - 0x80) * 2
+        s.cycles += 1
+
+
+def decided(s, condition):
+    """What earlier branches of the same path say of a condition, or the condition."""
+    if z3.is_true(condition) or z3.is_false(condition):
+        return z3.is_true(condition)
+    is_negated = z3.is_not(condition)
+    found = s.facts.get((condition.arg(0) if is_negated else condition).get_id())
+    return condition if found is None else found != is_negated
 
 
 def identity(value):
+    """What tells values in registers apart."""
     return value.get_id() if isinstance(value, z3.AstRef) else value if is_number(value) else id(value)
+
+
+class Division:
+    """Quotients and remainders of numbers that are not negative, also of terms: for these two new variables
+    stand, with what the division promises of them. The same dividend has the same ones."""
+
+    def __init__(self):
+        self.found, self.most, self.promises = {}, {}, []
+
+    def __call__(self, dividend, divisor):
+        if is_number(dividend):
+            quotient = abs(signed(dividend)) // divisor * (-1 if dividend >> 31 else 1)
+            return quotient & MASK, signed(dividend) - quotient * divisor & MASK
+        dividend = simple(dividend)
+        if is_number(dividend):
+            return self(dividend, divisor)
+        key = dividend.get_id(), divisor
+        if key not in self.found:
+            q, r = (z3.BitVec(f"{name} {len(self.found)}", 32) for name in ("quotient", "remainder"))
+            most = self.most.get(dividend.get_id(), 0x7FFFFFFF) // divisor
+            self.promises.append(z3.And(dividend == q * divisor + r, 0 <= r, r < divisor, 0 <= q, q <= most))
+            self.found[key] = dividend, q, r
+            self.most[q.get_id()] = most
+        return self.found[key][1:]
