@@ -425,7 +425,7 @@ def int_to_str(call, value, string, radix):
     rest, digits = -value if is_negative else value, []
     if radix > 1:
         for _ in range(len(string) - 2):
-            rest, digit = call.divide(rest, radix)
+            rest, digit = divmod(rest, radix) if isinstance(rest, int) else call.divide(rest, radix)
             unit = If(digit < 10, 48 + digit, 87 + digit)
             digits.append((unit & (0xFF if string.size == 1 else 0xFFFF), rest != 0))
     elif radix == 1:

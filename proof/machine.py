@@ -36,6 +36,10 @@ class Pause(Exception):
     """A state is about to load a unit, and waits for others that may meet it."""
 
 
+class Unsettled(Exception):
+    """A term whose values have to be told apart, since it is an address or the number of bits to shift by."""
+
+
 class Dropped:
     """What a register holds after states met that had different values in it."""
 
@@ -225,8 +229,6 @@ class Memory:
 
     def covered(self, address, size):
         """The addresses of the cells that an access covers."""
-        if not is_number(address):
-            raise GivenUp(f"an address that is no number: {address}")
         if address % size:
             raise Broken(f"an access of {size} bytes at {address:#x}, which is not aligned")
         unit = self.sizes.get(address)
@@ -243,7 +245,7 @@ class Memory:
         return None
 
     def load(self, address, size):
-        if is_number(address) and address not in self.sizes and address % size == 0:
+        if address not in self.sizes and address % size == 0:
             constant = self.constant(address, size)
             if constant is not None:
                 return constant
@@ -272,17 +274,17 @@ def shift_right(value, amount):
 
 
 class State:
-    """A moment of some paths: `path` is true in the solver where the contents take one of them, `example`
-    are such contents, `cycles` the most that any of them took, `lowest` the lowest stack pointer."""
+    """A moment of some paths: `path` is true in the solver where the contents take one of them, `cycles` the most that any of them took, `lowest` the lowest stack pointer."""
 
     def __init__(self, registers, memory, path):
         self.r, self.memory, self.path = registers, memory, path
-        self.cycles, self.lowest, self.loads, self.facts = 0, STACK_TOP, 0, {}
+        self.cycles, self.fewer, self.lowest, self.loads, self.facts = 0, 0, STACK_TOP, 0, {}
         self.paused, self.is_checked = False, False
 
     def copy(self):
         other = State(list(self.r), self.memory.copy(), self.path)
-        other.cycles, other.lowest, other.loads = self.cycles, self.lowest, self.loads
+        other.cycles, other.fewer, other.lowest = self.cycles, self.fewer, self.lowest
+        other.loads = self.loads
         other.facts = dict(self.facts)
         return other
 
@@ -292,9 +294,18 @@ class State:
             raise StillNeeded(*value.place)
         return value
 
+    def number(self, value):
+        """The value of a term, of which there is one in this state."""
+        if is_number(value):
+            return value
+        if value.get_id() not in self.facts:
+            raise Unsettled(value)
+        return self.facts[value.get_id()]
+
     def load(self, address, size):
+        address = self.number(address)
         self.check_stack(address)
-        if is_number(address) and address in self.memory.paced:
+        if address in self.memory.paced:
             self.pause()
         return self.memory.load(address, size)
 
@@ -305,11 +316,12 @@ class State:
         self.loads += 1
 
     def store(self, address, size, value):
+        address = self.number(address)
         self.check_stack(address)
         self.memory.store(address, size, value)
 
     def check_stack(self, address):
-        if is_number(address) and STACK_TOP - STACK_SIZE <= address < self.r[SP]:
+        if STACK_TOP - STACK_SIZE <= address < self.r[SP]:
             raise Broken("an access below the stack pointer, where interrupts write")
 
     def set_result(self, register, value, moved=None):
@@ -368,8 +380,8 @@ def shift_immediate(kind):
 
 def shift_register(kind):
     def execute(s, op):
-        d, amount = low(op, 0), s.get(low(op, 3))
-        if not is_number(amount) or amount & 0xFF > 32:
+        d, amount = low(op, 0), s.number(s.get(low(op, 3)))
+        if amount & 0xFF > 32:
             raise GivenUp(f"a shift by {amount}")
         if amount & 0xFF == 0:
             return s.set_result(d, s.get(d))
@@ -721,10 +733,13 @@ class Machine:
                 a, b = ours.get(cell, False), theirs.get(cell, False)
                 if not is_same(a, b):
                     ours[cell] = z3.If(one.path, a, b)
+        most = max(one.cycles, other.cycles)
+        fewer = [add(state.fewer, most - state.cycles) for state in (one, other)]
+        one.fewer = fewer[0] if is_same(*fewer) else z3.If(one.path, *map(term, fewer))
         one.path = self.named(z3.Or(one.path, other.path))
         one.facts = {number: holds for number, holds in one.facts.items() if other.facts.get(number) == holds}
         one.paused, one.is_checked = one.paused and other.paused, one.is_checked or other.is_checked
-        one.cycles, one.lowest = max(one.cycles, other.cycles), min(one.lowest, other.lowest)
+        one.cycles, one.lowest = most, min(one.lowest, other.lowest)
 
     def advance(self, s, ended):
         """Runs a state until it ends, or has to wait."""
@@ -749,6 +764,9 @@ class Machine:
             except Pause:
                 s.r[PC], s.paused = pc, True
                 return self.wait(s)
+            except Unsettled as term:
+                s.r[PC] = pc
+                return self.settle(s, *term.args)
         for register in self.needed[RETURN]:
             s.get(register)
         ended.append(s)
@@ -770,6 +788,20 @@ class Machine:
             s.r[register] = z3.BitVec(f"r{register} after division {next(self.numbers)}", 32)
         s.r[FLAGS] = Dropped(RETURN, FLAGS)
         s.jump(s.get(LR))
+
+    def settle(self, s, value):
+        """Makes a state of one of the values that a term can have, and another one of the rest."""
+        self.kept.append(value)
+        if self.is_possible(s.path):
+            one, rest = self.solver.model().eval(value, True), s.copy()
+            self.assume(s, value == one, True)
+            s.facts[value.get_id()] = one.as_long()
+            s.r = [one.as_long() if is_same(register, value) else register for register in s.r]
+            self.assume(rest, value == one, False)
+            rest.paused = s.paused
+            self.wait(s)
+            if self.is_possible(rest.path):
+                self.wait(rest)
 
     def branch(self, s, op):
         """A conditional branch: whether it goes both ways, and both states wait."""

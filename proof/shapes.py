@@ -41,8 +41,8 @@ def units_of(name, argument):
 
 def sizes(name, is_quick):
     own = OTHER.get(narrow(name), {})
-    arguments = [one.split(":")[0] for one in FUNCTIONS[narrow(name)][1].split()]
-    return {one: own.get(one, ANY[one])[is_quick] for one in arguments if one in ANY}
+    kinds = dict(one.split(":") for one in FUNCTIONS[narrow(name)][1].split())
+    return {one: own.get(one, ANY[one])[is_quick] for one in kinds if one in ANY and "radix" not in kinds}
 
 
 def variants(name):
@@ -133,7 +133,7 @@ class Shape:
 
     def units(self, argument, kind, size):
         if kind == "offset":
-            return [self.variant.get("off", 0)]
+            return [offset_of(self.variant)]
         count = self.most.get(argument, 0)
         if kind == "counted":
             count += 1  # the last unit can be the terminator as well
@@ -149,8 +149,8 @@ class Shape:
                       for number in range(count + 1, count + 2 + self.most["src"])]
         if kind in ("out", "pointers", "words"):
             units.append(unknown(f"{argument}[{count}]", size))  # which is not to change
-        if self.variant.get("off") and argument == "str":
-            units[self.variant["off"] - 1] = 0  # cut by an earlier call
+        if argument == "str" and offset_of(self.variant):
+            units[offset_of(self.variant) - 1] = 0  # cut by an earlier call
         return units
 
     def room(self):
@@ -194,6 +194,11 @@ class Shape:
         if self.variant.get(argument) == "sign":
             return z3.simplify(z3.SignExt(24, z3.Extract(7, 0, value)))
         return value & 0xFFFFFFFF if isinstance(value, int) else z3.simplify(value)
+
+
+def offset_of(variant):
+    """From where a token is looked for."""
+    return variant["off"] if isinstance(variant.get("off"), int) else 0
 
 
 def unknown(name, size):
