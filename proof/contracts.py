@@ -388,10 +388,11 @@ def str_trim(call, str, trimSet):
 # Replacing
 
 def str_replace(call, orig, rep, with_, result):
+    for text in (orig, rep, with_):
+        if text:
+            call.reads(text)
     if not orig or not rep or not with_:
         return 0
-    for text in (orig, rep, with_):
-        call.reads(text)
     is_real = rep.units[0] != 0
     passed, size = 0, 0  # units of an occurrence that are still to be passed; of the new text
     for index, when in enumerate(before_end(orig)):
