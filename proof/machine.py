@@ -152,7 +152,7 @@ def differ(a, b):
 
 class Flags:
     """What the last instruction that sets flags has left. N and Z are of its result; C and V follow from the
-    operands of a sum or a difference, else they are as `before`, but for the bit that a shift moved out."""
+    operands of a sum or a difference, else they are as `before`; C is the bit that a shift moved out, if any."""
 
     def __init__(self, result, before=None, sum=None, difference=None, moved=None):
         self.result, self.sum, self.difference, self.moved = result, sum, difference, moved
@@ -415,7 +415,8 @@ def add_with_carry(s, d, a, b):
             z3.If(carry, z3.BitVecVal(1, 33), z3.BitVecVal(0, 33))
         whole = z3.ZeroExt(1, term(a)) + z3.ZeroExt(1, term(b)) + bit
         result, carry = simple(z3.Extract(31, 0, whole)), z3.simplify(z3.Extract(32, 32, whole) == 1)
-    s.set_result(d, result, carry)
+    s.r[d] = result
+    s.r[FLAGS] = Flags(result, sum=(a, b), moved=carry)
 
 
 def logical(operation):
