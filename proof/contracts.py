@@ -453,22 +453,22 @@ def str_to_int(call, string):
     if not string:
         return 0
 
-    def digits(index, value):
+    def digits(index, sign, value=0):
         """The value and where reading ends."""
         unit = string.units[index]
         if index == len(string) - 1:
-            return value, index
-        more, end = digits(index + 1, value * 10 + (unit - 48))
+            return sign * value, index
+        more, end = digits(index + 1, sign, value * 10 + (unit - 48))
         is_digit = And(unit >= 48, unit <= 57)
-        return If(is_digit, more, value), If(is_digit, end, index)
+        return If(is_digit, more, sign * value), If(is_digit, end, index)
 
     call.reads(string)
     result, walked = 0, len(string) - 1
     for index in reversed(range(len(string) - 1)):
         unit = string.units[index]
-        positive, negative = digits(index, 0), digits(index + 1, 0)
+        positive, negative = digits(index, 1), digits(index + 1, -1)
         is_minus, is_blank = unit == ord("-"), Or(unit == 32, unit == 9)
-        result = If(is_blank, result, If(is_minus, -negative[0], positive[0]))
+        result = If(is_blank, result, If(is_minus, negative[0], positive[0]))
         walked = If(is_blank, walked, If(is_minus, negative[1], positive[1]))
     call.lengths["n"] = walked
     return result

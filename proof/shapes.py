@@ -11,16 +11,15 @@ BASE, DISTANCE = 0x20000000, 0x400  # where the arguments' arrays are
 
 # The most units of each argument in all calls, and in the quick ones; where a function is not named, in `ANY`.
 ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (6, 3),
-       "substr": (5, 2), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (3, 1), "string": (9, 4),
+       "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (3, 1), "string": (9, 4),
        "des": (9, 5)}
 OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {"str": (16, 5)},
          "StrCopy": {"src": (16, 5)}, "StrCopyBuf": {"src": (16, 5)}, "StrNCopy": {"src": (16, 5)},
          "StrChr": {"str": (32, 9)}, "StrCmp": {"str1": (16, 5), "str2": (16, 5)},
-         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrSplit": {"str": (6, 3), "dlmt": (3, 1)},
-         "WStrToStr": {"src": (3, 2)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
-         "WStrToWords": {"src": (16, 6), "des": (16, 6)}, "StrToWStr": {"src": (16, 5)}}
+         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"substr": (5, 3)}, "StrSplit": {"str": (6, 4), "dlmt": (3, 2)},
+         "WStrToStr": {"src": (3, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
+         "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)}}
 RADICES = 10, 16, 2, 3, 36, 37, 200, 65536, 1, 0, -1
-UNTIL = {"str": "text", "src": "text"}
 
 
 def narrow(name):
@@ -76,8 +75,8 @@ def variants(name):
         yield {"result": ("same", "orig")}
 
 
-def int_variants():
-    for radix in RADICES:
+def int_variants(is_quick):
+    for radix in (10, 16, 1, 0) if is_quick else RADICES:
         for value in ("zero", "positive", "negative", "least"):
             yield {"value": value, "radix": radix}
     yield {"value": "positive", "radix": 10, "string": "null"}
