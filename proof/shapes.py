@@ -18,7 +18,8 @@ OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {
          "StrChr": {"str": (32, 9)}, "StrCmp": {"str1": (16, 5), "str2": (16, 5)},
          "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"substr": (5, 3)}, "StrSplit": {"str": (6, 4), "dlmt": (3, 2)},
          "WStrToStr": {"src": (3, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
-         "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)}}
+         "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)},
+         "StrNCatBuf": {"dst": (5, 3)}}
 RADICES = 10, 16, 2, 3, 36, 37, 200, 65536, 1, 0, -1
 
 
