@@ -7,7 +7,8 @@ from pathlib import Path
 
 def functions(source):
     """The link symbols of the functions, by name."""
-    found = re.findall(r"^#define (\w+) (VELKO_\d+)$", Path(source, "include/SubName.h").read_text(), re.M)
+    header = Path(source, "include/SubName.h").read_text()
+    found = re.findall(r"^#define (\w+) (VELKO_\d+)$", header, re.M)
     if not found:
         sys.exit("include/SubName.h: no function is found")
     return dict(found)

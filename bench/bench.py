@@ -1,15 +1,18 @@
 #!/usr/bin/python3 -B
-"""bench.py IMAGES SOURCE [--fit]: counts the cycles of the library, of the C libraries and of naive loops,
-compares their results, and checks the library's upper bounds, bytes and stack. Fails where costs.csv, the
-performance page, its chart or README.md say something else; --fit searches for new bounds and writes all."""
+"""bench.py IMAGES SOURCE [--fit]: counts the cycles of the library, of the C libraries and of naive
+loops, compares their results, and checks the library's upper bounds, bytes and stack. Fails where
+costs.csv, the performance page, its chart or README.md differ; --fit searches for new bounds and
+writes all of these."""
 import difflib
 import math
 import re
+import reprlib
 import subprocess
 import sys
 from dataclasses import dataclass, field
 from itertools import product
 from pathlib import Path
+from typing import NamedTuple
 
 import costs
 import page
@@ -17,26 +20,24 @@ from calls import FUNCTIONS, PROSE
 from core import DATA, FILL, Core, Stopped
 from image import BadImage, Image
 
-# The promise of README.md, whatever the compiler's version: the most bytes of stack of any function.
-PROMISED_STACK = {"gcc-O2": 56, "gcc-O3": 56, "gcc-Os": 56, "gcc-O0": 88, "clang-O2": 68, "clang-Os": 64,
-                  "clang-O0": 512}
+# The most bytes of stack of any function. README.md promises them, whatever the compiler's version.
+PROMISED_STACK = {"gcc-O2": 56, "gcc-O3": 56, "gcc-Os": 56, "gcc-O0": 88, "clang-O2": 68,
+                  "clang-Os": 64, "clang-O0": 512}
 BUILDS = PROMISED_STACK
 LIBRARIES = "newlib", "picolibc-small", "picolibc"
-FAST_LOOPS = "loops-Os", "loops-O2", "loops-O3"
-LOOPS = *FAST_LOOPS, "loops-O0"
+LOOPS = *page.LOOPS, "loops-O0"
 WHAT_TO_DO = "If that is intended, run ./dev bench and review the diff."
 OURS = "gcc-O2"  # whose results the others' are compared with
 
 
 def loops_of(build):
-    """The naive loops of a firmware that is built so. The fastest of a fast build's count."""
-    return FAST_LOOPS if build.endswith(("2", "3")) else ("loops-" + build[-2:],)
+    """The naive loops of a firmware that is built so; beside a fast build the fastest counts."""
+    return page.LOOPS if build.endswith(("O2", "O3")) else ("loops-" + build[-2:],)
 
 
-@dataclass
-class Ratio:
-    """Our cycles / those of the fastest of others: the geometric mean over so many cases, and in how many of
-    them ours takes more than 2 % more."""
+class Ratio(NamedTuple):
+    """Our cycles / those of the fastest of others: the geometric mean over so many cases, and in
+    how many of them ours takes more than 2 % more."""
     mean: float
     cases: int
     slower: int
@@ -44,8 +45,8 @@ class Ratio:
 
 @dataclass
 class Measured:
-    """Cycles by image, function, about, units and misalignment; whose functions read outside their
-    arguments, as pairs of an image and a function; and what each build takes."""
+    """Cycles by image, function, about, units and misalignment; the pairs of an image and a
+    function that reads outside its arguments; and what each build takes."""
     cycles: dict = field(default_factory=dict)
     over_reads: set = field(default_factory=set)
     builds: dict = field(default_factory=dict)
@@ -56,7 +57,8 @@ class Measured:
                    default=None)
 
     def compare(self, build, others):
-        """Where alignment makes no difference, a case counts once. `others` are images, by function."""
+        """With others(function), which gives images. Where alignment makes no difference, a case
+        counts once."""
         pairs = set()
         for (image, name, about, n, misaligned), ours in self.cycles.items():
             theirs = self.fastest(others(name), name, about, n, misaligned)
@@ -96,13 +98,14 @@ def check_counter(images):
     name, = core.code
     core.run(name, [DATA], (1, 1))
     if name != f"counted_{core.cycles}_{core.stack}":
-        sys.exit(f"the counter is wrong: {name} takes {core.cycles} cycles and {core.stack} bytes of stack")
+        sys.exit(f"the counter is wrong: it counts {core.cycles} cycles and {core.stack} bytes of "
+                 f"stack for {name}")
 
 
 def demangled(core):
     """The link symbols, by the C++ name without its parameters."""
-    shown = subprocess.run(["arm-none-eabi-c++filt"], input="\n".join(core.code), capture_output=True,
-                           text=True, check=True).stdout
+    shown = subprocess.run(["arm-none-eabi-c++filt"], input="\n".join(core.code),
+                           capture_output=True, text=True, check=True).stdout
     return {line.split("(")[0]: symbol for line, symbol in zip(shown.splitlines(), core.code)}
 
 
@@ -118,8 +121,7 @@ def symbol_of(names, image, function, name):
 
 
 def call(core, image, symbol, function, name, case, n, misaligned):
-    """Makes the call of a case. Gives its cycles and what comes of it: the results, and the contents of all
-    buffers."""
+    """Makes the call of a case. Gives its cycles, the results, and the contents of all buffers."""
     is_peer = image in LIBRARIES
     arguments, widths = case.arguments(n, PROSE[:n]), function.widths_of(name)
     core.run(symbol, arguments, widths, misaligned, function.order if is_peer else ())
@@ -136,15 +138,16 @@ def call(core, image, symbol, function, name, case, n, misaligned):
 
 
 def measure_case(core, image, symbol, function, name, case, measured, expected):
-    """Fails where a call gives something else than is expected of all images: what the first one gave, which
-    is ours and proved by the tests."""
+    """Fails where a call gives something else than is expected of all images: what the first one
+    gave, which is ours and is checked by the tests."""
     for n, misaligned in product(case.sizes, (False, True)):
         where = f"{image}: {name}{', ' * bool(case.about)}{case.about}, {n} units"
         try:
             cycles, *outcome = call(core, image, symbol, function, name, case, n, misaligned)
         except Stopped as error:
             sys.exit(f"{where}: {error}")
-        differs = difference(outcome, expected.setdefault((name, case.about, n, misaligned), outcome))
+        wanted = expected.setdefault((name, case.about, n, misaligned), outcome)
+        differs = difference(outcome, wanted)
         if differs:
             sys.exit(f"{where}: {differs}")
         if core.outside and image not in LIBRARIES:
@@ -167,7 +170,8 @@ def difference(found, wanted):
 
 def measure_cases(images):
     measured, expected = Measured(), {}
-    measured.libraries = [library for library in LIBRARIES if library != "newlib" or (images / "newlib").exists()]
+    measured.libraries = [library for library in LIBRARIES
+                          if library != "newlib" or (images / "newlib").exists()]
     for image in (*BUILDS, *measured.libraries, *LOOPS):
         core = Core(Image(images / image, needs_library=False), watches=True)
         names = demangled(core) if image in LOOPS else {}
@@ -181,24 +185,18 @@ def measure_cases(images):
 
 def check_cost(build, function, cost, cycles, bytes, stack):
     """The bound is that of the same calls: none is above it, and one within a cycle."""
-    title, slack = function.title(function.name), []
+    title, slack = function.title, []
     for number, found in cycles.items():
         arguments, lengths = function.calls[number]
         slack.append(cost.of(lengths) - found)
         if slack[-1] < 0:
-            sys.exit(f"{build}: {title} takes {found} cycles with {shown(arguments)}, more than "
-                     f"{cost.formula()} = {cost.of(lengths):g}. {WHAT_TO_DO}")
+            sys.exit(f"{build}: {title} takes {found} cycles with {reprlib.repr(arguments)}, its "
+                     f"bound is {cost.formula()} = {cost.of(lengths):g}. {WHAT_TO_DO}")
     if min(slack) >= 1:
         sys.exit(f"{build}: {title}: no call comes near its bound, {cost.formula()}. {WHAT_TO_DO}")
     if (bytes, stack) != (cost.bytes, cost.stack):
-        sys.exit(f"{build}: {title} has {bytes} bytes and takes {stack} of stack, costs.csv has {cost.bytes} "
-                 f"and {cost.stack}. {WHAT_TO_DO}")
-
-
-def shown(arguments):
-    """The arguments, of long strings the beginning."""
-    parts = map(repr, arguments)
-    return "(" + ", ".join(part if len(part) < 40 else part[:30] + "...'" for part in parts) + ")"
+        sys.exit(f"{build}: {title} has {bytes} bytes and takes {stack} of stack, costs.csv has "
+                 f"{cost.bytes} and {cost.stack}. {WHAT_TO_DO}")
 
 
 def check_build(images, build, stated, is_compared):
@@ -206,23 +204,30 @@ def check_build(images, build, stated, is_compared):
     core = Core(Image(images / build), watches=True)
     everything, alone, deepest = {}, [], 0
     for function in FUNCTIONS:
-        title = function.title(function.name)
+        title, numbers = function.title, stated[OURS, function.title].worst
         try:
-            cycles, stack, parts = costs.search(core, function, function.names(), stated[OURS, title].worst)
-        except (Stopped, IndexError) as error:
+            cycles, stack, parts = costs.search(core, function, function.names(), numbers)
+        except Stopped as error:
             sys.exit(f"{build}: {title}: {error}")
         sizes = [sum(one.values()) for one in parts]
         for one in parts:
             everything.update(one)
         if not function.about:
             alone += sizes
-        deepest = max(deepest, *stack.values())
+        deep = max(stack.values())
+        deepest = max(deepest, deep)
         if deepest > PROMISED_STACK[build]:
             sys.exit(f"{build}: {title} takes {deepest} bytes of stack, README.md promises "
                      f"{PROMISED_STACK[build]}")
         if is_compared and build in costs.BUILDS:
-            check_cost(build, function, stated[build, title], cycles, max(sizes), max(stack.values()))
+            check_cost(build, function, stated[build, title], cycles, max(sizes), deep)
     return Build(sum(everything.values()), mean(alone), deepest)
+
+
+def check_complete():
+    missing = set(costs.SYMBOLS) - {name for function in FUNCTIONS for name in function.names()}
+    if missing:
+        sys.exit(f"bench/calls.py has no entry for {', '.join(sorted(missing))}")
 
 
 def versions_of(images):
@@ -243,12 +248,13 @@ def fit_all(images):
     for build in costs.BUILDS:
         core = Core(Image(images / build))
         for function in FUNCTIONS:
-            fitted[build, function.title(function.name)] = costs.fit_function(core, function)
+            fitted[build, function.title] = costs.fit_function(core, function)
     return fitted
 
 
 def main():
     images, source, fits = Path(sys.argv[1]), Path(sys.argv[2]), sys.argv[3:] == ["--fit"]
+    check_complete()
     check_counter(images)
     versions = versions_of(images)
     if fits:
@@ -258,8 +264,8 @@ def main():
     for build in BUILDS:
         measured.builds[build] = check_build(images, build, stated, versions == made_with)
     if versions != made_with:
-        print(f"Not compared: the bounds, docs/performance.md and README.md's figures, because they are of "
-              f"{', '.join(made_with)}, and here is {', '.join(versions)}.")
+        print("Not compared: the bounds, docs/performance.md and README.md's figures, because they "
+              f"are of {', '.join(made_with)}, and here is {', '.join(versions)}.")
         return
     differ = False
     for name, text in page.make(source, stated, measured, versions, PROMISED_STACK).items():
@@ -276,5 +282,5 @@ def main():
 if __name__ == "__main__":
     try:
         main()
-    except BadImage as error:
+    except (BadImage, OSError) as error:
         sys.exit(error)

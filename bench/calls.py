@@ -1,23 +1,24 @@
-"""The library's functions: the calls that may be the worst of their lengths, and those that a C library or
-a naive loop can make as well. Each function has an entry in FUNCTIONS, at the end."""
+"""The library's functions: the calls that may be the worst of their lengths, and those that a C
+library or a naive loop can make as well. Each function has an entry in FUNCTIONS, at the end."""
 from dataclasses import dataclass
 from itertools import product
 from typing import Callable, NamedTuple
 
-from core import Buffer, Same, Words
+from core import SAME, Buffer
 
 INT_MAX = 0x7FFFFFFF
 OUT = Buffer(None)  # as large as need be
 
-# Up to three units every string of some classes of unit is tried. Then come lengths around the iterations
-# of a loop that is unrolled four times, and one so long that only the cost per unit counts.
+# Up to three units every string of some classes of unit is tried. Then come lengths around the
+# iterations of a loop that is unrolled four times, and one so long that only the cost per unit
+# counts.
 SHORT = range(4)
 LONG = 5, 8, 16, 17, 18, 19, 34, 35, 64, 65, 66, 67, 131
 VERY_LONG = 515
 
 
-# Candidates for the worst case. Each generator gives pairs: the arguments of a call, and the lengths that
-# its upper bound depends on.
+# Candidates for the worst case. Each generator gives pairs: the arguments of a call, and the
+# lengths that its upper bound depends on.
 
 
 def alternate(one, other, length):
@@ -25,8 +26,8 @@ def alternate(one, other, length):
 
 
 def strings(*classes):
-    """All short strings of such units; long ones of one unit with another at the end, or of two that
-    alternate; very long ones that alternate."""
+    """All short strings of such units; long ones of one unit with another at the end, or of two
+    that alternate; very long ones that alternate."""
     for length in SHORT:
         for units in product(classes, repeat=length):
             yield "".join(units)
@@ -65,10 +66,12 @@ def copies(arguments, counts=counts_around):
 
 def appends(arguments, counts=counts_around):
     """By arguments(dst, src, count, capacity)."""
-    for d, length in product((0, 1, 2, 3, 16, 17, 64, 67, 515), (0, 1, 2, 3, 4, 5, 8, 16, 19, 64, 65, 67, 515)):
+    more = *SHORT, 4, 5, 8, 16, 19, 64, 65, 67, VERY_LONG
+    for d, length in product((*SHORT, 16, 17, 64, 67, VERY_LONG), more):
+        dst, src = Buffer(None, "a" * d), "b" * length
         for count in counts(length):
             capacity = min(d + count + 1, INT_MAX)
-            yield arguments(Buffer(None, "a" * d), "b" * length, count, capacity), {"d": d, "n": taken(length, count)}
+            yield arguments(dst, src, count, capacity), {"d": d, "n": taken(length, count)}
 
 
 def find_unit():
@@ -95,7 +98,8 @@ def find_string(fold=str):
 def compares(ignores_case=False, has_count=False):
     pairs = [(string, string) for string in strings("x")]
     if ignores_case:
-        pairs += [pair for string in strings("x") for pair in ((string, string.upper()), (string.upper(), string))]
+        pairs += [(string, string.upper()) for string in strings("x")]
+        pairs += [(string.upper(), string) for string in strings("x")]
     ends = ("", ""), ("1", "2"), ("@", "`"), ("x", ""), ("", "x"), ("A", "b"), ("b", "A")
     for (one, two), (end1, end2) in product(pairs, ends):
         if has_count:
@@ -103,7 +107,6 @@ def compares(ignores_case=False, has_count=False):
                 yield (one + end1, two + end2, count), {"n": taken(len(one), count)}
         else:
             yield (one + end1, two + end2), {"n": len(one)}
-    yield ("x", Same(0), 9)[:3 if has_count else 2], {"n": 0}
 
 
 def token_end(string, members):
@@ -125,11 +128,10 @@ def with_sets(arguments, end=lambda string, members: len(string)):
 
 
 def replaces(result):
-    texts = []
+    patterns = "a", "b", "aa", "ab", "aab", "aaab", "aaaaaaab", "abababab", "a" * 15 + "b"
+    texts = list(product(strings("a", "b"), patterns, (0, 1, 9)))
     for m, w in product(range(1, 18), (*range(6), *range(16, 20), 34, 35)):
         texts += [(orig, "a" * m, w) for orig in ("", "a", "a" * 67 if m == 1 else "aab")]
-    patterns = "a", "b", "aa", "ab", "aab", "aaab", "aaaaaaab", "abababab", "a" * 15 + "b"
-    texts += [(orig, rep, w) for rep, w in product(patterns, (0, 1, 9)) for orig in strings("a", "b")]
     for orig, rep, w in texts:
         r = len(orig.replace(rep, "y" * w))
         yield (orig, rep, "y" * w, result), {"n": len(orig), "m": len(rep), "w": w, "r": r}
@@ -164,18 +166,13 @@ def arrays():
 
 
 def escapes():
+    """With every capacity at which the last unit is the first that may not fit."""
     written = {"x": 1, "\n": 6, "\uffff": 9}
     for string in strings(*written):
         size = sum(written[unit] for unit in string)
-        truncating = range(max(size - 10, 0), size) if len(string) < 16 else []
-        for capacity in (*truncating, size, size + 1, INT_MAX):
-            room, n = capacity - 1, 0
-            for unit in string:
-                n += 1  # the unit that does not fit is read
-                room -= written[unit]
-                if room < 0:
-                    break
-            yield (string, OUT, capacity), {"n": n}
+        last = written[string[-1]] if string else 1
+        for capacity in (*range(size - last + 1, size + 2), INT_MAX):
+            yield (string, OUT, capacity), {"n": len(string)}
     for unit in "\x80\u0100\u0fff\u1000~\x7f":
         yield (unit, OUT, 20), {"n": 1}
 
@@ -187,15 +184,15 @@ def characters():
 
 # What others can do as well.
 
-PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the blinds "
-         "by 9. ") * 3
+PROSE = ("Set the Alarm to 7 and dim Every lamp in the Hall; if Nobody is at home: Close the "
+         "blinds by 9. ") * 3
 DIGITS = "1234567890"
 SIZES, DIGIT_SIZES, ONE_SIZE = (4, 16, 64, 256), (1, 4, 10), (16,)
 
 
 class Case(NamedTuple):
-    """A call in several sizes: arguments(n, t) gives it for n units, and t are n units of prose. A call that
-    repeats is made until it returns null."""
+    """A call in several sizes: arguments(n, t) gives it for n units, and t are n units of prose.
+    One that repeats is made until it returns null."""
     about: str
     arguments: Callable
     sizes: tuple = SIZES
@@ -204,9 +201,10 @@ class Case(NamedTuple):
 
 @dataclass
 class Function:
-    """A function of the library, and its wide version if it has one. Where it has two upper bounds, `about`
-    tells them apart. A C library's `peer` takes the arguments in an `order` of its own. `widths` are the
-    bytes of a unit of the first argument and of the others, where the name does not say them."""
+    """A function of the library, and its wide version if it has one. Where it has two upper bounds,
+    `about` tells them apart. A C library's `peer` takes the arguments in an `order` of its own.
+    `widths` are the bytes of a unit of the first argument and of the others, where the name does
+    not say them."""
     name: str
     wide: str
     terms: list  # of the upper bound
@@ -215,7 +213,7 @@ class Function:
     peer: str = ""
     order: tuple = ()
     returns: str = "nothing"  # or "number"; "sign", if a C library promises no more; or "pointer"
-    nulls: tuple = (0, 1, 2, 3)  # the arguments that may be null, in a call of which all lengths are 0
+    nulls: tuple = (0, 1, 2, 3)  # arguments that may be null, in a call of which all lengths are 0
     about: str = ""
     widths: tuple = ()
 
@@ -235,14 +233,18 @@ class Function:
     def names(self):
         return [name for name in (self.name, self.wide) if name]
 
-    def title(self, name):
+    @property
+    def title(self):
+        return self.title_of(self.name)
+
+    def title_of(self, name):
         return f"{name}, {self.about}" if self.about else name
 
     def widths_of(self, name):
         return self.widths or ((2, 2) if name == self.wide or name.startswith("W") else (1, 1))
 
 
-N, SET = ["1", "n"], ["1", "n", "n m", "m"]
+N, APPEND, FIND, SET = ["1", "n"], ["1", "d", "n"], ["1", "n", "n m"], ["1", "n", "n m", "m"]
 FUNCTIONS = [
     Function("StrLen", "WStrLen", N, one_string("x"), [
         Case("", lambda n, t: (t,))], "strlen", returns="number"),
@@ -254,36 +256,36 @@ FUNCTIONS = [
     Function("StrLower", "WStrLower", N, one_string("1", "A", "a", "{"), [
         Case("mixed case", lambda n, t: (t,))], "strlwr", returns="pointer"),
 
-    Function("StrCopy", "WStrCopy", N, [
-        *copies(lambda src, _: (OUT, src), uncounted), (("x", Same(0)), {"n": 0})], [
+    Function("StrCopy", "WStrCopy", N, copies(lambda src, _: (OUT, src), uncounted), [
         Case("", lambda n, t: (Buffer(n + 1), t))], "strcpy"),
-    Function("StrCopyBuf", "WStrCopyBuf", N, [
-        *copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)), (("x", 9, Same(0)), {"n": 0})], [
+    Function("StrCopyBuf", "WStrCopyBuf", N,
+             copies(lambda src, count: (OUT, min(count + 1, INT_MAX), src)), [
         Case("", lambda n, t: (Buffer(n + 1), n + 1, t))], "strlcpy", (0, 2, 1)),
-    Function("StrNCopy", "WStrNCopy", N, [
-        *copies(lambda src, count: (OUT, src, count)), (("x", Same(0), 9), {"n": 0})], [
+    Function("StrNCopy", "WStrNCopy", N, copies(lambda src, count: (OUT, src, count)), [
         Case("with the terminator", lambda n, t: (Buffer(n + 4), t, n + 4)),
         Case("truncated", lambda n, t: (Buffer(n), t + "more", n))], "strncpy"),
 
-    Function("StrCat", "WStrCat", ["1", "d", "n"], appends(lambda dst, src, *_: (dst, src), uncounted), [
+    Function("StrCat", "WStrCat", APPEND, appends(lambda dst, src, *_: (dst, src), uncounted), [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), t[n // 2:]))], "strcat"),
-    Function("StrCatBuf", "WStrCatBuf", ["1", "d", "n"], appends(lambda dst, src, _, n: (dst, n, src)), [
-        Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:]))], "strlcat", (0, 2, 1)),
-    Function("WStrNCat", "", ["1", "d", "n"], appends(lambda dst, src, num, _: (dst, src, num)), [
+    Function("StrCatBuf", "WStrCatBuf", APPEND, appends(lambda dst, src, _, n: (dst, n, src)), [
+        Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:]))],
+        "strlcat", (0, 2, 1)),
+    Function("WStrNCat", "", APPEND, appends(lambda dst, src, num, _: (dst, src, num)), [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), t[n // 2:], n))]),
-    Function("WStrNCatBuf", "", ["1", "d", "n"], [
+    Function("WStrNCatBuf", "", APPEND, [
         *appends(lambda dst, src, _, n: (dst, n, src, INT_MAX)),
         *appends(lambda dst, src, num, _: (dst, INT_MAX, src, num))], [
         Case("", lambda n, t: (Buffer(n + 1, t[:n // 2]), n + 1, t[n // 2:], n))]),
 
     Function("StrChr", "WStrChr", N, find_unit(), [
         Case("not found", lambda n, t: (t, ord("~")))], "strchr", returns="pointer"),
-    Function("StrStr", "WStrStr", ["1", "n", "n m"], find_string(), [
+    Function("StrStr", "WStrStr", FIND, find_string(), [
         Case("found late", lambda n, t: (t[:-4] + "dawn", "dawn")),
         Case("first unit repeated", lambda n, t: ("a" * n, "ab"))], "strstr", returns="pointer"),
-    Function("StrIStr", "WStrIStr", ["1", "n", "n m"], find_string(str.lower), [
+    Function("StrIStr", "WStrIStr", FIND, find_string(str.lower), [
         Case("found late", lambda n, t: (t[:-4] + "dawn", "DaWn")),
-        Case("first unit repeated", lambda n, t: ("a" * n, "Ab"))], "strcasestr", returns="pointer"),
+        Case("first unit repeated", lambda n, t: ("a" * n, "Ab"))],
+        "strcasestr", returns="pointer"),
 
     Function("StrNCmp", "WStrNCmp", N, compares(has_count=True), [
         Case("to the end", lambda n, t: (t, t, n + 4)),
@@ -298,10 +300,13 @@ FUNCTIONS = [
         Case("same case", lambda n, t: (t, t)),
         Case("other case", lambda n, t: (t, t.swapcase()))], "strcasecmp", returns="sign"),
 
-    Function("StrToken", "WStrToken", SET, with_sets(lambda s, dlmt: (s, Words(1), dlmt), token_end), [
-        Case("all tokens", lambda n, t: (t, Words(1), " "), repeats=True)], "strtok_r", (0, 2, 1), returns="pointer"),
-    Function("StrSplit", "WStrSplit", SET, with_sets(lambda s, dlmt: (s, dlmt, Words(len(s)))), [
-        Case("", lambda n, t: (t, " ", Words(n // 2)))], "peer_split", returns="number"),
+    Function("StrToken", "WStrToken", SET,
+             with_sets(lambda s, dlmt: (s, bytes(4), dlmt), token_end), [
+        Case("all tokens", lambda n, t: (t, bytes(4), " "), repeats=True)],
+        "strtok_r", (0, 2, 1), returns="pointer"),
+    Function("StrSplit", "WStrSplit", SET,
+             with_sets(lambda s, dlmt: (s, dlmt, bytes(4 * len(s)))), [
+        Case("", lambda n, t: (t, " ", bytes(2 * n)))], "peer_split", returns="number"),
     Function("StrTrim", "WStrTrim", SET, [
         *with_sets(lambda s, members: (s, members)),
         *(((s, 0), {"n": len(s), "m": 0}) for s in strings("x"))], [
@@ -312,8 +317,7 @@ FUNCTIONS = [
         Case("one unit by two", lambda n, t: (t, " ", "__", Buffer(n + t.count(" ") + 1)))],
         "peer_replace", returns="number", nulls=(0, 1, 2)),
     Function("StrReplace", "WStrReplace", ["1", "n", "n m", "m", "w"], [
-        *replaces(0), (("x", "a", "y", Same(0)), {"n": 1, "m": 1, "w": 1, "r": 1})], [],
-        about="null result"),
+        *replaces(0), *replaces(SAME)], [], about="null result", nulls=(0, 1, 2)),
 
     Function("IntToStr", "IntToWStr", ["1", "k"], integers(), [
         Case("radix 10", lambda n, t: (int(DIGITS[:n]), Buffer(n + 1), 10), DIGIT_SIZES)],

@@ -1,6 +1,6 @@
-"""A simulated Cortex-M0+ that counts cycles. Unicorn runs the instructions; this adds up what each takes
-by the timing table of the core's Technical Reference Manual, with zero wait states and the multiplier of
-one cycle. The cycles of a block of instructions are worked out once."""
+"""A simulated Cortex-M0+ that counts cycles. Unicorn runs the instructions; this adds up what each
+takes by the timing table of the core's Technical Reference Manual, with zero wait states and the
+multiplier of one cycle. The cycles of a block of instructions are worked out once."""
 from bisect import bisect
 from typing import NamedTuple
 
@@ -15,26 +15,18 @@ RETURN = RAM
 DATA, DATA_SIZE = RAM + 0x4000, 0x14000
 STRIDE = 0x4000  # between two arguments
 STACK_TOP = RAM + RAM_SIZE
-ENDLESS = 50_000_000  # cycles
+ENDLESS = 5_000_000  # cycles: no call of the search takes a tenth of that
 PAGE = 0x1000
 FILL = 0xA5  # what a watched buffer has in it before a call
+SAME = object()  # an argument that is the same pointer as the first
 CODECS = {1: "latin-1", 2: "utf-16-le"}  # by the bytes of a unit
 
 
-class Same(NamedTuple):
-    """An argument that is the same pointer as an earlier one."""
-    index: int
-
-
 class Buffer(NamedTuple):
-    """An argument that has room for so many units, or for as many as need be, and may hold a string."""
+    """An argument that has room for so many units, or for as many as need be, and may hold
+    a string."""
     units: int | None
-    held: str | None = None
-
-
-class Words(NamedTuple):
-    """An argument that points to so many integers or pointers. All are 0."""
-    count: int
+    held: str | bytes = b""
 
 
 class Stopped(Exception):
@@ -73,9 +65,9 @@ def is_conditional(op):
 
 
 class Core:
-    """A core with an image in its memory. After run(): `cycles`; `stack`, the most bytes below the caller's
-    stack pointer; `result`, the register R0; `registers`, the arguments as numbers; and, if memory is
-    watched, `outside`, the first access outside the arguments, or None."""
+    """A core with an image in its memory. After run(): `cycles`; `stack`, the most bytes below the
+    caller's stack pointer; `result`, the register R0; `registers`, the arguments as numbers; and,
+    if memory is watched, `outside`, the first access outside the arguments, or None."""
 
     def __init__(self, image, watches=False):
         self.uc = unicorn.Uc(unicorn.UC_ARCH_ARM, unicorn.UC_MODE_THUMB | unicorn.UC_MODE_MCLASS)
@@ -93,26 +85,23 @@ class Core:
         self.uc.hook_add(unicorn.UC_HOOK_BLOCK, self.on_block)
         self.uc.hook_add(unicorn.UC_HOOK_MEM_UNMAPPED, self.on_unmapped)
         if watches:
-            self.uc.hook_add(unicorn.UC_HOOK_MEM_READ, self.on_read, None, DATA, DATA + DATA_SIZE - 1)
-            self.uc.hook_add(unicorn.UC_HOOK_MEM_WRITE, self.on_write, None, DATA, DATA + DATA_SIZE - 1)
+            data = DATA, DATA + DATA_SIZE - 1
+            self.uc.hook_add(unicorn.UC_HOOK_MEM_READ, self.on_read, None, *data)
+            self.uc.hook_add(unicorn.UC_HOOK_MEM_WRITE, self.on_write, None, *data)
 
     def load(self, segments):
         pages = {page for address, data in segments
                  for page in range(address // PAGE, (address + len(data) - 1) // PAGE + 1)}
         if not pages.isdisjoint(range(RAM // PAGE, STACK_TOP // PAGE)):
             raise BadImage(f"has something at {RAM:#x}, where the simulated caller is")
-        for page in sorted(pages):
-            if page - 1 not in pages:
-                end = page + 1
-                while end in pages:
-                    end += 1
-                self.uc.mem_map(page * PAGE, (end - page) * PAGE)
+        for page in pages:
+            self.uc.mem_map(page * PAGE, PAGE)
         for address, data in segments:
             self.uc.mem_write(address, data)
 
     def analyse(self, address, size):
-        """Of a block: its cycles, the bytes that it pushes in all and at most, and the address behind it if
-        it ends in a conditional branch."""
+        """Of a block: its cycles, the bytes that it pushes in all and at most, and the address
+        behind it if it ends in a conditional branch."""
         code = bytes(self.uc.mem_read(address, size))
         cycles = depth = deepest = at = op = width = 0
         while at < size:
@@ -140,8 +129,8 @@ class Core:
             self.uc.emu_stop()
 
     def parts(self):
-        """The sizes, by address, of the functions that ran since the blocks were cleared, but for the
-        compiler's division, which most firmware has anyway."""
+        """The sizes, by address, of the functions that ran since the blocks were cleared, but for
+        the compiler's division, which most firmware has anyway."""
         found = {self.starts[bisect(self.starts, address) - 1] for address, _ in self.blocks}
         return {start: self.sizes[start] for start in found - self.division}
 
@@ -162,27 +151,26 @@ class Core:
 
     def put(self, place, argument, width):
         """Writes what a pointer's argument holds to its place."""
-        string = argument.held if isinstance(argument, Buffer) else argument
-        if isinstance(argument, Words):
-            held = bytes(4 * argument.count)
-        else:
-            held = b"" if string is None else (string + "\0").encode(CODECS[width])
+        held = argument.held if isinstance(argument, Buffer) else argument
+        if isinstance(held, str):
+            held = (held + "\0").encode(CODECS[width])
         self.uc.mem_write(place, held)
         if self.watches:
             size = len(held)
             if isinstance(argument, Buffer):
                 size = STRIDE if argument.units is None else argument.units * width
                 self.uc.mem_write(place + len(held), bytes([FILL]) * (size - len(held)))
-            if not isinstance(argument, Words):
+            if not isinstance(argument, bytes):
                 self.buffers.append((place, size))
             start = place - DATA
             self.readable[start:start + len(held)] = b"\1" * len(held)
             self.writable[start:start + size] = b"\1" * size
 
     def run(self, symbol, arguments, widths, misaligned=False, order=()):
-        """Puts the arguments into memory and makes a call with all of them, or in an order of its own.
-        `widths` are the bytes of a unit of the first argument and of the others; misaligned arguments are
-        not word-aligned."""
+        """Puts the arguments into memory and makes a call with all of them, or in an order of its
+        own. An argument is a number, a string, a buffer, or the bytes of integers or pointers.
+        `widths` are the bytes of a unit of the first argument and of the others; misaligned strings
+        are not word-aligned."""
         self.outside = None
         if self.watches:
             self.readable, self.writable = bytearray(DATA_SIZE), bytearray(DATA_SIZE)
@@ -192,10 +180,10 @@ class Core:
             width = widths[index > 0]
             if isinstance(argument, int):
                 place = argument
-            elif isinstance(argument, Same):
-                place = self.places[argument.index]
+            elif argument is SAME:
+                place = self.places[0]
             else:
-                if misaligned and not isinstance(argument, Words):
+                if misaligned and not isinstance(argument, bytes):
                     place += width * (3 if index else 1)
                 self.put(place, argument, width)
             self.places.append(place)

@@ -64,11 +64,11 @@ def check_target(elf):
     if not found:
         raise BadImage("does not say which core it is for: .ARM.attributes has no architecture")
     if found[0] not in ARMV6M:
-        raise BadImage("for another core: only ARMv6-M, the Cortex-M0 and Cortex-M0+, can be simulated")
+        raise BadImage("for another core: only the Cortex-M0 and Cortex-M0+ can be simulated")
 
 
 def segments(elf):
-    """Those that are loaded, where they are when the program runs; what the file does not have is 0."""
+    """Those that are loaded, where they are when the program runs. What the file lacks is 0."""
     found = []
     for segment in elf.iter_segments():
         size = segment["p_memsz"]

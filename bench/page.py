@@ -1,4 +1,4 @@
-"""Writes the performance page, its chart and README.md's figures, from the costs and what is measured."""
+"""Writes the performance page, its chart and README.md's figures."""
 import math
 import re
 from string import Template
@@ -7,7 +7,8 @@ import costs
 from calls import DIGIT_SIZES, FUNCTIONS, SIZES
 
 TITLES = {**costs.BUILDS, "gcc-O3": "GCC -O3", "gcc-O0": "GCC -O0", "clang-O0": "Clang -O0",
-          "newlib": "newlib", "picolibc-small": "picolibc, small", "picolibc": "picolibc, fast"}
+          "newlib": "newlib", "picolibc-small": "picolibc, small", "picolibc": "picolibc, fast",
+          "loop": "naive loop"}
 BUILDS = "gcc-O2", "clang-O2", "gcc-Os"  # that the tables of cycles have
 LOOPS = "loops-Os", "loops-O2", "loops-O3"
 README = re.compile(r"(<!-- figures: .* -->\n).*?(<!-- end of figures -->)", re.S)
@@ -19,49 +20,66 @@ def table(heads, lines):
 
 
 def names(function):
-    return function.title(" ".join(f"`{name}`" for name in function.names()))
-
-
-def label(function, case):
-    return f"`{function.name}`" + (f", {case.about}" if case.about else "")
-
-
-def build_table(measured):
-    heads = ["Build", "one function", "all 50", "stack", "cycles beside C libraries", "without over-reads",
-             "beside naive loops"]
-    lines = []
-    for name, build in measured.builds.items():
-        ratios = (measured.beside_libraries(name), measured.beside_exact_libraries(name),
-                  measured.beside_loops(name))
-        lines.append([TITLES[name], f"{build.alone:.0f}", f"{build.bytes:,}", build.stack,
-                      *(f"{ratio.mean:.2f} ({ratio.slower} of {ratio.cases} slower)" for ratio in ratios)])
-    return table(heads, lines)
+    """As a table has them."""
+    found = " ".join(f"`{name}`" for name in function.names())
+    return function.title_of(found)
 
 
 def cases(sizes):
-    """Those that have numbers of digits as their sizes, or those that have not."""
-    return [(function, case) for function in FUNCTIONS for case in function.cases
+    """The calls that are compared: those of numbers if the sizes are digits, or all others."""
+    return [(f"`{function.name}`" + (f", {case.about}" if case.about else ""), function, case)
+            for function in FUNCTIONS for case in function.cases
             if (case.sizes == DIGIT_SIZES) == (sizes == DIGIT_SIZES)]
+
+
+def build_table(measured):
+    lines = []
+    for name, build in measured.builds.items():
+        ratios = [f"{ratio.mean:.2f} ({ratio.slower} of {ratio.cases} slower)" for ratio in (
+            measured.beside_libraries(name), measured.beside_exact_libraries(name),
+            measured.beside_loops(name))]
+        lines.append([TITLES[name], f"{build.alone:.0f}", f"{build.bytes:,}", build.stack, *ratios])
+    return table(["Build", "one function", "all 50", "stack", "cycles beside C libraries",
+                  "without over-reads", "beside naive loops"], lines)
+
+
+def readme_table(measured, promised):
+    """The stack is the promised one, which holds for other versions of the compilers as well."""
+    levels = {"gcc-O2": "GCC `-O2`, also `-Og`, `-O1`", "clang-O2": "Clang `-O2`",
+              "gcc-Os": "GCC `-Os`", "clang-Os": "Clang `-Os`", "gcc-O0": "GCC `-O0`"}
+    lines = []
+    for name, level in levels.items():
+        build = measured.builds[name]
+        ratios = measured.beside_exact_libraries(name), measured.beside_loops(name)
+        lines.append([level, f"{build.alone:.0f} bytes", f"{build.bytes:,} bytes", 0,
+                      f"{promised[name]} bytes", *(f"{ratio.mean:.2f}" for ratio in ratios)])
+    return table(["Build", "one function", "all 50", "static RAM", "stack",
+                  "cycles beside C libraries", "beside loops"], lines)
 
 
 def cycle_table(measured, sizes):
     """Ours, of word-aligned strings."""
-    heads = ["Function"] + [f"{TITLES[build]}: {n}" if n == sizes[0] else n for build in BUILDS for n in sizes]
-    return table(heads, [[label(function, case)] + [
-        measured.cycles.get((build, function.name, case.about, n, False), "") for build in BUILDS for n in sizes]
-        for function, case in cases(sizes)])
+    columns = [(build, n) for build in BUILDS for n in sizes]
+    heads = [f"{TITLES[build]}: {n}" if n == sizes[0] else n for build, n in columns]
+    return table(["Function", *heads], [
+        [label, *(measured.cycles.get((build, function.name, case.about, n, False), "")
+                  for build, n in columns)]
+        for label, function, case in cases(sizes)])
 
 
 def size_table(stated):
-    heads = ["Function"] + [f"{title}: bytes, stack" for title in costs.BUILDS.values()]
-    return table(heads, [[names(function)] + [
-        f"{stated[build, function.title(function.name)].bytes}, {stated[build, function.title(function.name)].stack}"
-        for build in costs.BUILDS] for function in FUNCTIONS])
+    lines = []
+    for function in FUNCTIONS:
+        found = [stated[build, function.title] for build in costs.BUILDS]
+        lines.append([names(function), *(f"{cost.bytes}, {cost.stack}" for cost in found)])
+    heads = [f"{title}: bytes, stack" for title in costs.BUILDS.values()]
+    return table(["Function", *heads], lines)
 
 
 def bound_tables(stated):
-    return "\n".join(table(["Function", f"{title}: cycles, at most"], [
-        [names(function), stated[build, function.title(function.name)].formula()] for function in FUNCTIONS])
+    return "\n".join(
+        table(["Function", f"{title}: cycles, at most"],
+              [[names(one), stated[build, one.title].formula()] for one in FUNCTIONS])
         for build, title in costs.BUILDS.items())
 
 
@@ -71,12 +89,11 @@ def images_of(other):
 
 def comparison_table(measured, sizes, shown):
     """GCC -O2 beside the others, in the sizes that are shown."""
-    others = ["gcc-O2", *measured.libraries, "loop"]
-    titles = {"gcc-O2": "strutil", "loop": "naive loop"}
-    heads = ["Function"] + [f"{titles.get(other) or TITLES[other]}, {n}" for n in shown for other in others]
-    return table(heads, [[label(function, case)] + [
-        comparison_cell(measured, other, function, case, n) for n in shown for other in others]
-        for function, case in cases(sizes)])
+    titles = {"gcc-O2": "strutil", **{one: TITLES[one] for one in (*measured.libraries, "loop")}}
+    columns = [(other, n) for n in shown for other in titles]
+    return table(["Function", *(f"{titles[other]}, {n}" for other, n in columns)], [
+        [label, *(comparison_cell(measured, other, function, case, n) for other, n in columns)]
+        for label, function, case in cases(sizes)])
 
 
 def comparison_cell(measured, other, function, case, n):
@@ -91,23 +108,13 @@ def comparison_cell(measured, other, function, case, n):
     return " / ".join(f"{one}{mark}" for one in dict.fromkeys(cycles))
 
 
-def readme_table(measured, promised):
-    """The promised stack, which holds for other versions of the compilers as well."""
-    heads = ["Build", "one function", "all 50", "static RAM", "stack", "cycles beside C libraries", "beside loops"]
-    levels = {"gcc-O2": "GCC `-O2`, also `-Og`, `-O1`", "clang-O2": "Clang `-O2`", "gcc-Os": "GCC `-Os`",
-              "clang-Os": "Clang `-Os`", "gcc-O0": "GCC `-O0`"}
-    return table(heads, [[
-        level, f"{measured.builds[build].alone:.0f} bytes", f"{measured.builds[build].bytes:,} bytes", 0,
-        f"{promised[build]} bytes", f"{measured.beside_exact_libraries(build).mean:.2f}",
-        f"{measured.beside_loops(build).mean:.2f}"] for build, level in levels.items()])
-
-
 def wide_extra(measured):
     """By how many percent a wide function is slower than its narrow one, at most."""
-    return max(math.ceil(100 * measured.cycles[build, function.wide, case.about, n, False]
-                         / measured.cycles[build, function.name, case.about, n, False] - 100)
-               for build in BUILDS for function in FUNCTIONS if function.wide
-               for case in function.cases for n in case.sizes)
+    ratios = [measured.cycles[build, function.wide, case.about, n, False]
+              / measured.cycles[build, function.name, case.about, n, False]
+              for build in BUILDS for function in FUNCTIONS if function.wide
+              for case in function.cases for n in case.sizes]
+    return math.ceil(100 * max(ratios) - 100)
 
 
 def make(source, stated, measured, versions, promised):
@@ -115,7 +122,7 @@ def make(source, stated, measured, versions, promised):
     example = stated["gcc-O2", "StrCmp"]
     page = Template((source / "bench/page.md").read_text()).substitute(
         versions=", ".join(versions),
-        example=example.formula().replace(" n", " x 16") + f" = {example.of({'n': 16}):g}",
+        example=f"{example.formula().replace(' n', ' x 16')} = {example.of({'n': 16}):g}",
         example_cycles=measured.cycles["gcc-O2", "StrCmp", "equal", 16, False],
         wide_extra=wide_extra(measured),
         build_table=build_table(measured),
@@ -125,34 +132,25 @@ def make(source, stated, measured, versions, promised):
         bound_tables=bound_tables(stated),
         comparison_table=comparison_table(measured, SIZES, (16, 256)),
         digit_comparison=comparison_table(measured, DIGIT_SIZES, (4, 10)))
-    readme, count = README.subn(lambda found: found[1] + readme_table(measured, promised) + found[2],
-                                (source / "README.md").read_text())
+    readme, count = README.subn(
+        lambda found: found[1] + readme_table(measured, promised) + found[2],
+        (source / "README.md").read_text())
     if count != 1:
-        raise SystemExit("README.md: the lines <!-- figures: ... --> and <!-- end of figures --> are not there once")
-    return {"docs/performance.md": page, "docs/performance.svg": chart(measured), "README.md": readme}
+        raise SystemExit("README.md must have the lines <!-- figures: ... --> and "
+                         f"<!-- end of figures --> once; they are there {count} times")
+    return {"docs/performance.md": page, "docs/performance.svg": chart(measured),
+            "README.md": readme}
 
 
 # The chart is written directly, for light and for dark pages.
-SHOWN = [("StrLen", ""), ("StrCopy", ""), ("StrCopyBuf", ""), ("StrCat", ""), ("StrChr", "not found"),
-         ("StrCmp", "equal"), ("StrICmp", "same case"), ("StrUpper", "mixed case"),
-         ("StrStr", "found late"), ("StrIStr", "found late"), ("StrToken", "all tokens"),
+SHOWN = [("StrLen", ""), ("StrCopy", ""), ("StrCopyBuf", ""), ("StrCat", ""),
+         ("StrChr", "not found"), ("StrCmp", "equal"), ("StrICmp", "same case"),
+         ("StrUpper", "mixed case"), ("StrStr", "found late"), ("StrToken", "all tokens"),
          ("StrReplace", "one unit by two")]
 SERIES = [("gcc-O2", "strutil", "#2f81c1"), ("newlib", "newlib", "#d9822b"),
           ("picolibc", "picolibc, built for speed", "#5a9e6f"), ("loop", "naive loop", "#999999")]
 UNITS = 256
-AXIS_MAX = 50  # cycles per unit; a longer bar is broken
-LEFT, SCALE, BAR, GAP = 200, 7.5, 9, 7  # pixels: of the bars' beginning, a cycle, a bar and between groups
-
-
-def bar(y, cycles, fill):
-    """A bar with its number, broken by a slanted gap if it is too long."""
-    length = min(cycles, AXIS_MAX) * SCALE
-    lines = [f'<rect x="{LEFT}" y="{y}" width="{length:.1f}" height="{BAR - 1}" {fill}/>']
-    if cycles > AXIS_MAX:
-        x = LEFT + length - 24
-        lines.append(f'<path d="M{x} {y + BAR} l5 -{BAR + 1} h5 l-5 {BAR + 1} z" class="page"/>')
-    lines.append(f'<text x="{LEFT + length + 4:.1f}" y="{y + BAR - 1}" font-size="10">{cycles:.1f}</text>')
-    return lines
+LEFT, SCALE, BAR, GAP = 200, 6.5, 9, 7  # pixels: where bars begin, a cycle, a bar, between groups
 
 
 def chart(measured):
@@ -174,10 +172,20 @@ def chart(measured):
                      f'<text x="{x + 14}" y="37">{name}</text>')
         x += 30 + 6 * len(name)
     size = f'width="640" height="{y}" viewBox="0 0 640 {y}"'
-    return f"""<svg xmlns="http://www.w3.org/2000/svg" {size} font-family="sans-serif" font-size="12">
+    title = f"Cycles per unit, strings of {UNITS} units (lower is better)"
+    return f"""<svg xmlns="http://www.w3.org/2000/svg" {size}
+ font-family="sans-serif" font-size="12">
 <style>text {{ fill: #1f2328 }} .page {{ fill: #fff }}
 @media (prefers-color-scheme: dark) {{ text {{ fill: #e6edf3 }} .page {{ fill: #0d1117 }} }}</style>
 <rect width="640" height="{y}" class="page"/>
-<text x="320" y="16" text-anchor="middle" font-size="14">Cycles per unit, strings of {UNITS} units: lower is better</text>
-<text x="{LEFT}" y="54" font-size="11">hollow: reads past the end of the string</text>
+<text x="320" y="16" text-anchor="middle" font-size="14">{title}</text>
+<text x="{LEFT}" y="54" font-size="11">hollow bar: reads past the end of the string</text>
 """ + "\n".join(lines) + "\n</svg>\n"
+
+
+def bar(y, cycles, fill):
+    """A bar and its number."""
+    length = cycles * SCALE
+    place = f'x="{LEFT + length + 4:.1f}" y="{y + BAR - 1}"'
+    return [f'<rect x="{LEFT}" y="{y}" width="{length:.1f}" height="{BAR - 1}" {fill}/>',
+            f'<text {place} font-size="10">{cycles:.1f}</text>']

@@ -1,5 +1,5 @@
 /* What a C library has no single function for, put together from those that it has. */
-#define _GNU_SOURCE
+#define _GNU_SOURCE  // NOLINT(bugprone-reserved-identifier): for strcasestr
 #include <stdlib.h>
 #include <string.h>
 
