@@ -4,8 +4,8 @@ from itertools import chain, combinations
 
 import z3
 
-from contracts import FUNCTIONS, Array, Call, Or
-from machine import Division, Memory, term
+from contracts import FUNCTIONS, Array, Call
+from machine import Division, Memory
 
 BASE, DISTANCE = 0x20000000, 0x400  # where the arguments' arrays are
 
