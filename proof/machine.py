@@ -1,18 +1,22 @@
-"""A Cortex-M0+ that computes with unknown values: a register or a unit of memory holds a number or, where
-the contents are any, a term of the solver Z3. A conditional branch that can go both ways makes two states
-of one; states that meet at the same place become one again, whose memory says which content came from where.
-What it does not know ends in an error: an instruction, an access or an address that is not a number."""
+"""A Cortex-M0+ that computes with unknown values. A register or a unit of memory holds a number
+or, where the contents can be any, a term of the solver Z3. A conditional branch that can go both
+ways makes two states of one. States that meet at the same place become one again, whose memory
+says which content came from where. What the machine does not know ends in an error."""
 import heapq
+import operator
 from itertools import count
 
 import z3
 
+from contracts import Not, Or
+
 MASK = 0xFFFFFFFF
-SP, LR, PC = 13, 14, 15
+SP, LR, PC, FLAGS = 13, 14, 15, 16  # numbers of registers
 RETURN = 0xFFFFFFF0  # where the caller of the function is
 STACK_TOP, STACK_SIZE = 0x20008000, 256
-STEP_LIMIT = 1000000
+STACK_END = STACK_TOP - STACK_SIZE
 KEPT = (4, 5, 6, 7, 8, 9, 10, 11, SP)
+STEP_LIMIT = 1000000
 CHECK_LIMIT = 100000000  # what one question to the solver may take, in units of its own
 
 
@@ -21,7 +25,7 @@ class GivenUp(Exception):
 
 
 class Broken(Exception):
-    """The code breaks a rule that holds for every function. `state` has an example of it."""
+    """The code breaks a rule that holds for every function; `state` says where."""
 
     def __init__(self, message, state=None):
         super().__init__(message)
@@ -29,7 +33,7 @@ class Broken(Exception):
 
 
 class StillNeeded(Exception):
-    """A register was taken for one that is not read again, at a place where states meet."""
+    """A register was dropped where states met, and is read later: place and register."""
 
 
 class Pause(Exception):
@@ -37,7 +41,7 @@ class Pause(Exception):
 
 
 class Unsettled(Exception):
-    """A term whose values have to be told apart, since it is an address or the number of bits to shift by."""
+    """A term whose values have to be told apart: an address, or by how many bits to shift."""
 
 
 class Dropped:
@@ -47,7 +51,8 @@ class Dropped:
         self.place = pc, register
 
 
-# Arithmetic: each function computes with numbers at once, and makes a term otherwise.
+# Arithmetic, with a number as result where both operands are numbers.
+
 
 def is_number(value):
     return isinstance(value, int)
@@ -58,66 +63,43 @@ def term(value):
 
 
 def simple(value):
-    """A number if the term is one, else the term in its shortest form."""
     value = z3.simplify(value)
     return value.as_long() if z3.is_bv_value(value) else value
 
 
-def is_same(a, b):
-    if a is b:
-        return True
-    if isinstance(a, z3.AstRef):
-        return isinstance(b, z3.AstRef) and a.eq(b)
-    return is_number(a) and is_number(b) and a == b
+def operation(of):
+    def compute(a, b):
+        if is_number(a) and is_number(b):
+            return of(a, b) & MASK
+        return simple(of(term(a), term(b)))
+    return compute
+
+
+add, subtract, multiply = map(operation, (operator.add, operator.sub, operator.mul))
+bit_and, bit_or, bit_xor = map(operation, (operator.and_, operator.or_, operator.xor))
 
 
 def signed(number):
     return (number ^ 0x80000000) - 0x80000000
 
 
-def add(a, b):
-    return (a + b) & MASK if is_number(a) and is_number(b) else simple(term(a) + term(b))
+def is_same(a, b):
+    if isinstance(a, z3.AstRef):
+        return a is b or isinstance(b, z3.AstRef) and a.eq(b)
+    return a is b or is_number(a) and is_number(b) and a == b
 
 
-def subtract(a, b):
-    return (a - b) & MASK if is_number(a) and is_number(b) else simple(term(a) - term(b))
-
-
-def multiply(a, b):
-    return (a * b) & MASK if is_number(a) and is_number(b) else simple(term(a) * term(b))
-
-
-def bit_and(a, b):
-    return a & b if is_number(a) and is_number(b) else simple(term(a) & term(b))
-
-
-def bit_or(a, b):
-    return a | b if is_number(a) and is_number(b) else simple(term(a) | term(b))
-
-
-def bit_xor(a, b):
-    return a ^ b if is_number(a) and is_number(b) else simple(term(a) ^ term(b))
-
-
-def bit_not(a):
-    return bit_xor(a, MASK)
-
-
-def extended(value, bits, with_sign):
+def extended(value, bits, with_sign=False):
     """The low bits of a value as 32 bits."""
     if is_number(value):
         value &= (1 << bits) - 1
-        return (value - (1 << bits)) & MASK if with_sign and value >> (bits - 1) else value
+        return (value - (1 << bits)) & MASK if with_sign and value >> bits - 1 else value
     low = z3.Extract(bits - 1, 0, value)
-    return simple(z3.SignExt(32 - bits, low) if with_sign else z3.ZeroExt(32 - bits, low))
+    return simple((z3.SignExt if with_sign else z3.ZeroExt)(32 - bits, low))
 
 
 def has_bit(value, bit):
     return bool(value >> bit & 1) if is_number(value) else z3.Extract(bit, bit, value) == 1
-
-
-def is_equal(a, b):
-    return a == b if is_number(a) and is_number(b) else term(a) == term(b)
 
 
 def is_lower(a, b):
@@ -130,56 +112,49 @@ def is_less(a, b):
     return signed(a) < signed(b) if is_number(a) and is_number(b) else term(a) < term(b)
 
 
-def negation(condition):
-    return not condition if isinstance(condition, bool) else z3.Not(condition)
-
-
-def either(a, b):
-    if isinstance(a, bool):
-        return True if a else b
-    if isinstance(b, bool):
-        return True if b else a
-    return z3.Or(a, b)
-
-
-def differ(a, b):
-    if isinstance(a, bool):
-        return negation(b) if a else b
-    if isinstance(b, bool):
-        return negation(a) if b else a
-    return z3.Xor(a, b)
+def shifted(value, amount, kind):
+    """The value of a shift by 1 to 32, and the last bit that it moves out."""
+    if kind == "LSL":
+        return multiply(value, 1 << amount & MASK), has_bit(value, 32 - amount)
+    if is_number(value):
+        result = (signed(value) if kind == "ASR" else value) >> amount & MASK
+    elif kind == "ASR":
+        result = simple(value >> min(amount, 31))
+    else:
+        result = simple(z3.LShR(value, amount))
+    return result, has_bit(value, amount - 1)
 
 
 class Flags:
-    """What the last instruction that sets flags has left. N and Z are of its result; C and V follow from the
-    operands of a sum or a difference, else they are as `before`; C is the bit that a shift moved out, if any."""
+    """What the last instruction that sets flags has left. N and Z are of its result. C and V follow
+    from the operands of a sum or a difference, else they are as `before`. `carry` is C where it is
+    another: the bit that a shift moved out."""
 
-    def __init__(self, result, before=None, sum=None, difference=None, moved=None):
-        self.result, self.sum, self.difference, self.moved = result, sum, difference, moved
-        is_plain = isinstance(before, Flags) and not (before.sum or before.difference) and before.moved is None
-        self.before = before.before if is_plain else before
+    def __init__(self, result, before=None, sum=None, difference=None, carry=None):
+        self.result, self.sum, self.difference, self.carry = result, sum, difference, carry
+        keeps_both = isinstance(before, Flags) and not before.sum and not before.difference \
+            and before.carry is None
+        self.before = before.before if keeps_both else before
 
     def n(self):
         return has_bit(self.result, 31)
 
     def z(self):
-        return is_equal(self.result, 0)
+        return self.result == 0
 
     def c(self):
-        if self.moved is not None:
-            return self.moved
+        if self.carry is not None:
+            return self.carry
         if self.sum:
             return is_lower(self.result, self.sum[0])
-        return negation(is_lower(*self.difference)) if self.difference else self.earlier().c()
+        return Not(is_lower(*self.difference)) if self.difference else self.earlier().c()
 
     def v(self):
-        if self.sum:
-            a, b = self.sum
-            return has_bit(bit_and(bit_xor(a, self.result), bit_xor(b, self.result)), 31)
-        if self.difference:
-            a, b = self.difference
-            return has_bit(bit_and(bit_xor(a, b), bit_xor(a, self.result)), 31)
-        return self.earlier().v()
+        if not self.sum and not self.difference:
+            return self.earlier().v()
+        a, b = self.sum or self.difference
+        other = bit_xor(b, self.result) if self.sum else bit_xor(a, b)
+        return has_bit(bit_and(bit_xor(a, self.result), other), 31)
 
     def earlier(self):
         if isinstance(self.before, Dropped):
@@ -190,91 +165,88 @@ class Flags:
 
     def has(self, number):
         """Whether a condition of the manual's table holds: EQ, NE, CS, CC and so on."""
-        if self.difference and number >> 1 in (0, 4, 5, 6):
+        kind = number >> 1
+        if self.difference and kind in (0, 4, 5, 6):
             a, b = self.difference
-            found = {0: is_equal(a, b), 4: is_lower(b, a), 5: negation(is_less(a, b)),
-                     6: is_less(b, a)}[number >> 1]
-        elif number >> 1 < 4:
-            found = [self.z, self.c, self.n, self.v][number >> 1]()
-        elif number >> 1 == 4:
-            found = negation(either(negation(self.c()), self.z()))
+            found = a == b if kind == 0 else is_lower(b, a) if kind == 4 else \
+                Not(is_less(a, b)) if kind == 5 else is_less(b, a)
+        elif kind < 4:
+            found = (self.z, self.c, self.n, self.v)[kind]()
+        elif kind == 4:
+            found = Not(Or(Not(self.c()), self.z()))
         else:
-            is_less_than = differ(self.n(), self.v())
-            found = negation(is_less_than if number >> 1 == 5 else either(self.z(), is_less_than))
-        return negation(found) if number & 1 else found
+            found = Not(Or(self.z() if kind == 6 else False, self.n() != self.v()))
+        return Not(found) if number & 1 else found
 
 
 class Memory:
-    """The arrays of the caller, and the stack. A cell is a unit of an array, at its address; there is
-    nothing beside the cells. `read` and `written` say when a cell was, as numbers or terms: what the
-    function read before it wrote there itself counts only."""
+    """The arrays of the caller, and the stack. A cell is a unit of an array, at its address; there
+    is nothing beside the cells. `read` and `written` say when a cell was: what the function read
+    before it wrote there itself counts only. Before a load from a `paced` cell states wait."""
 
     def __init__(self, segments):
         self.segments, self.paced = segments, set()
         self.sizes, self.cells, self.read, self.written = {}, {}, {}, {}
-        self.give(STACK_TOP - STACK_SIZE, 4, [0xAAAAAAAA] * (STACK_SIZE // 4))
+        self.give(STACK_END, 4, [0xAAAAAAAA] * (STACK_SIZE // 4))
 
-    def give(self, address, size, units, paced=False):
+    def give(self, address, size, units, is_paced=False):
         for index, unit in enumerate(units):
-            if paced:
-                self.paced.add(address + size * index)
             self.cells[address + size * index] = unit
             self.sizes[address + size * index] = size
+        if is_paced:
+            self.paced.update(range(address, address + size * len(units), size))
 
     def copy(self):
         other = Memory.__new__(Memory)
         other.segments, other.sizes, other.paced = self.segments, self.sizes, self.paced
-        other.cells, other.read, other.written = dict(self.cells), dict(self.read), dict(self.written)
+        other.cells, other.read, other.written = \
+            dict(self.cells), dict(self.read), dict(self.written)
         return other
 
     def covered(self, address, size):
         """The addresses of the cells that an access covers."""
         if address % size:
             raise Broken(f"an access of {size} bytes at {address:#x}, which is not aligned")
-        unit = self.sizes.get(address)
-        if unit and unit <= size:
-            covered = range(address, address + size, unit)
-            if all(self.sizes.get(cell) == unit for cell in covered):
-                return covered
-        raise Broken(f"an access of {size} bytes at {address:#x}, where the caller has given none")
-
-    def constant(self, address, size):
-        for start, data in self.segments:
-            if start <= address and address + size <= start + len(data):
-                return int.from_bytes(data[address - start:address - start + size], "little")
-        return None
+        unit = self.sizes.get(address, size)
+        covered = range(address, address + size, min(unit, size))
+        if unit > size or any(self.sizes.get(cell) != unit for cell in covered):
+            raise Broken(f"an access of {size} bytes at {address:#x}, where nothing is given")
+        return covered
 
     def load(self, address, size):
         if address not in self.sizes and address % size == 0:
-            constant = self.constant(address, size)
+            constant = number_at(self.segments, address, size)
             if constant is not None:
                 return constant
-        cells = self.covered(address, size)
-        for cell in cells:
-            self.read[cell] = either(self.read.get(cell, False), negation(self.written.get(cell, False)))
-        value = self.cells[address]
-        for index, cell in enumerate(cells[1:], 1):
-            value = bit_or(value, multiply(self.cells[cell], 1 << (8 * self.sizes[cell] * index)))
+        value = self.cells.get(address)
+        for cell in self.covered(address, size):
+            is_own = self.written.get(cell, False)
+            self.read[cell] = Or(self.read.get(cell, False), Not(is_own))
+            if cell > address:
+                value = bit_or(value, multiply(self.cells[cell], 1 << 8 * (cell - address)))
         return value
 
     def store(self, address, size, value):
-        cells = self.covered(address, size)
-        for index, cell in enumerate(cells):
+        for cell in self.covered(address, size):
             bits = 8 * self.sizes[cell]
-            part = value
-            if bits < 32:
-                shifted = part if index == 0 else shift_right(part, bits * index)
-                part = extended(shifted, bits, False)
-            self.cells[cell] = part
+            part = shifted(value, 8 * (cell - address), "LSR")[0] if cell > address else value
+            self.cells[cell] = extended(part, bits) if bits < 32 else part
             self.written[cell] = True
 
 
-def shift_right(value, amount):
-    return value >> amount if is_number(value) else simple(z3.LShR(value, amount))
+def number_at(segments, address, size):
+    """A number that the image has at an address, or None."""
+    for start, data in segments:
+        if start <= address and address + size <= start + len(data):
+            return int.from_bytes(data[address - start:address - start + size], "little")
+    return None
 
 
 class State:
-    """A moment of some paths: `path` is true in the solver where the contents take one of them, `cycles` the most that any of them took, `lowest` the lowest stack pointer."""
+    """A moment of some paths. `path` is true in the solver where the contents take one of them, and
+    `facts` are what they have in common: numbers of conditions and whether these hold, numbers of
+    terms and their values. `cycles` are the most of any path, `fewer` by how many a path took less,
+    `lowest` is the lowest stack pointer, `loads` are counted from paced cells."""
 
     def __init__(self, registers, memory, path):
         self.r, self.memory, self.path = registers, memory, path
@@ -284,8 +256,7 @@ class State:
     def copy(self):
         other = State(list(self.r), self.memory.copy(), self.path)
         other.cycles, other.fewer, other.lowest = self.cycles, self.fewer, self.lowest
-        other.loads = self.loads
-        other.facts = dict(self.facts)
+        other.loads, other.facts = self.loads, dict(self.facts)
         return other
 
     def get(self, register):
@@ -302,12 +273,11 @@ class State:
             raise Unsettled(value)
         return self.facts[value.get_id()]
 
-    def load(self, address, size):
+    def place(self, address):
         address = self.number(address)
-        self.check_stack(address)
-        if address in self.memory.paced:
-            self.pause()
-        return self.memory.load(address, size)
+        if STACK_END <= address < self.r[SP]:
+            raise Broken("an access below the stack pointer, where interrupts write")
+        return address
 
     def pause(self):
         """Stops before a load, once, so that others can meet this state."""
@@ -315,25 +285,26 @@ class State:
             raise Pause
         self.loads += 1
 
-    def store(self, address, size, value):
-        address = self.number(address)
-        self.check_stack(address)
+    def load(self, address, size):
+        address = self.place(address)
+        if address in self.memory.paced:
+            self.pause()
+        return self.memory.load(address, size)
+
+    def store(self, address, size, register):
+        address = self.place(address)
+        is_saved = address >= STACK_END  # which is no use of a register yet
+        value = self.r[register] if is_saved else self.get(register)
         self.memory.store(address, size, value)
 
-    def check_stack(self, address):
-        if STACK_TOP - STACK_SIZE <= address < self.r[SP]:
-            raise Broken("an access below the stack pointer, where interrupts write")
-
-    def set_result(self, register, value, moved=None):
-        """A result that changes N and Z, and C if a shift moved out a bit."""
-        self.r[register] = value
-        self.r[FLAGS] = Flags(value, self.r[FLAGS], moved=moved)
+    def set(self, register, value, carry=None):
+        """A result that sets N and Z; and C, if a shift moved out a bit."""
+        self.r[register], self.r[FLAGS] = value, Flags(value, self.r[FLAGS], carry=carry)
 
     def move_stack(self, value):
         if not is_number(value):
             raise GivenUp("a stack pointer that is no number")
-        self.r[SP] = value
-        self.lowest = min(self.lowest, value)
+        self.r[SP], self.lowest = value, min(self.lowest, value)
 
     def jump(self, target):
         """To an address with its lowest bit set, as BX, BLX and POP do."""
@@ -342,107 +313,114 @@ class State:
         self.r[PC] = target & ~1
 
 
-FLAGS = 16  # after the 16 registers of the manual
+# Instructions. Each function takes a state, in which PC is the address of the next instruction, and
+# the encoding. The fields have the manual's names: d of the destination, n and m of the operands.
 
 
-# Instructions. Each function takes the state, in which PC is the address of the next instruction, and the
-# encoding. The names of the fields are the manual's: d of the destination, n and m of the operands.
-
-def low(op, bit):
-    return op >> bit & 7
+def field(bit):
+    """A low register of an encoding, from a bit on."""
+    return lambda op: op >> bit & 7
 
 
-def shifted(value, amount, kind):
-    """The value of a shift by 1 to 32, and the last bit that it moves out."""
-    if kind == "LSL":
-        if is_number(value):
-            return value << amount & MASK, bool(value << amount >> 32 & 1)
-        return multiply(value, 1 << amount & MASK), has_bit(value, 32 - amount)
-    kept = min(amount, 31)
-    if is_number(value):
-        result = signed(value) >> kept & MASK if kind == "ASR" else value >> amount
-    elif kind == "ASR":
-        result = simple(value >> kept)
-    else:
-        result = simple(z3.LShR(value, amount)) if amount < 32 else 0
-    return result, has_bit(value, amount - 1)
+at0, at3, at6, at8 = map(field, (0, 3, 6, 8))
+
+
+def high_d(op):
+    return op & 7 | op >> 4 & 8
+
+
+def high_m(op):
+    return op >> 3 & 15
+
+
+def byte(_, op):
+    return op & 0xFF
+
+
+def bits3(_, op):
+    return op >> 6 & 7
+
+
+def register(at):
+    return lambda s, op: s.get(at(op))
+
+
+def sum_of(n, operand, d=None):
+    def execute(s, op):
+        a, b = s.get(n(op)), operand(s, op)
+        result = add(a, b)
+        s.r[FLAGS] = Flags(result, sum=(a, b))
+        if d:
+            s.r[d(op)] = result
+    return execute
+
+
+def difference_of(first, operand, d=None):
+    def execute(s, op):
+        a, b = first(s, op), operand(s, op)
+        result = subtract(a, b)
+        s.r[FLAGS] = Flags(result, difference=(a, b))
+        if d:
+            s.r[d(op)] = result
+    return execute
+
+
+def logical(of, keeps=True):
+    def execute(s, op):
+        result = of(s.get(at0(op)), s.get(at3(op)))
+        s.r[FLAGS] = Flags(result, s.r[FLAGS])
+        if keeps:
+            s.r[at0(op)] = result
+    return execute
+
+
+def with_carry(changed):
+    """a + b + C, which ADCS does as it is and SBCS with the complement of b."""
+    def execute(s, op):
+        a, b, carry = s.get(at0(op)), changed(s.get(at3(op))), s.get(FLAGS).c()
+        whole = z3.ZeroExt(1, term(a)) + z3.ZeroExt(1, term(b)) + \
+            z3.If(carry, z3.BitVecVal(1, 33), z3.BitVecVal(0, 33))
+        result, last = simple(z3.Extract(31, 0, whole)), simple(z3.Extract(32, 32, whole))
+        s.r[at0(op)] = result
+        s.r[FLAGS] = Flags(result, sum=(a, b), carry=last == 1)
+    return execute
+
+
+def complement(value):
+    return bit_xor(value, MASK)
 
 
 def shift_immediate(kind):
     def execute(s, op):
-        amount, value = op >> 6 & 31, s.get(low(op, 3))
+        amount, value = op >> 6 & 31, s.get(at3(op))
         if kind == "LSL" and amount == 0:  # MOVS between registers
-            return s.set_result(low(op, 0), value)
-        value, carry = shifted(value, amount or 32, kind)
-        s.set_result(low(op, 0), value, carry)
+            return s.set(at0(op), value)
+        s.set(at0(op), *shifted(value, amount or 32, kind))
     return execute
 
 
 def shift_register(kind):
     def execute(s, op):
-        d, amount = low(op, 0), s.number(s.get(low(op, 3)))
-        if amount & 0xFF > 32:
+        value, amount = s.get(at0(op)), s.number(s.get(at3(op))) & 0xFF
+        if amount > 32:
             raise GivenUp(f"a shift by {amount}")
-        if amount & 0xFF == 0:
-            return s.set_result(d, s.get(d))
-        value, carry = shifted(s.get(d), amount & 0xFF, kind)
-        s.set_result(d, value, carry)
+        s.set(at0(op), *(shifted(value, amount, kind) if amount else (value,)))
     return execute
-
-
-def set_sum(s, d, a, b):
-    result = add(a, b)
-    s.r[FLAGS] = Flags(result, sum=(a, b))
-    if d is not None:
-        s.r[d] = result
-
-
-def set_difference(s, d, a, b):
-    result = subtract(a, b)
-    s.r[FLAGS] = Flags(result, difference=(a, b))
-    if d is not None:
-        s.r[d] = result
-
-
-def add_with_carry(s, d, a, b):
-    """a + b + C, which ADCS does as it is and SBCS with the complement of b."""
-    carry = s.get(FLAGS).c()
-    if isinstance(carry, bool) and is_number(a) and is_number(b):
-        whole = a + b + carry
-        result, carry = whole & MASK, whole > MASK
-    else:
-        bit = z3.BitVecVal(int(carry), 33) if isinstance(carry, bool) else \
-            z3.If(carry, z3.BitVecVal(1, 33), z3.BitVecVal(0, 33))
-        whole = z3.ZeroExt(1, term(a)) + z3.ZeroExt(1, term(b)) + bit
-        result, carry = simple(z3.Extract(31, 0, whole)), z3.simplify(z3.Extract(32, 32, whole) == 1)
-    s.r[d] = result
-    s.r[FLAGS] = Flags(result, sum=(a, b), moved=carry)
-
-
-def logical(operation):
-    def execute(s, op):
-        s.set_result(low(op, 0), operation(s.get(low(op, 0)), s.get(low(op, 3))))
-    return execute
-
-
-def tst(s, op):
-    s.r[FLAGS] = Flags(bit_and(s.get(low(op, 0)), s.get(low(op, 3))), s.r[FLAGS])
 
 
 def mov_high(s, op):
-    d, m = op & 7 | op >> 4 & 8, op >> 3 & 15
-    value = s.r[PC] + 2 if m == PC else s.r[m]
+    d, m = high_d(op), high_m(op)
     if d == PC:
-        value = s.get(m)
         s.cycles += 1
-        return s.jump(value | 1 if is_number(value) else value)
-    if d == SP:
-        return s.move_stack(s.get(m))
-    s.r[d] = value
+        s.jump(bit_or(s.get(m), 1))
+    elif d == SP:
+        s.move_stack(s.get(m))
+    else:
+        s.r[d] = s.r[PC] + 2 if m == PC else s.r[m]
 
 
 def add_high(s, op):
-    d, m = op & 7 | op >> 4 & 8, op >> 3 & 15
+    d, m = high_d(op), high_m(op)
     if PC in (d, m):
         raise GivenUp("an ADD with PC")
     value = add(s.get(d), s.get(m))
@@ -451,54 +429,54 @@ def add_high(s, op):
     s.r[d] = value
 
 
-def cmp_high(s, op):
-    set_difference(s, None, s.get(op & 7 | op >> 4 & 8), s.get(op >> 3 & 15))
-
-
 def bx(s, op):
-    target = s.get(op >> 3 & 15)
+    target = s.get(high_m(op))
     if op & 0x80:  # BLX
         s.r[LR] = s.r[PC] | 1
     s.jump(target)
 
 
-def memory_access(size, is_load, address_of, with_sign=False):
-    def execute(s, op):
-        register, address = address_of(s, op)
-        if not is_load:
-            on_stack = is_number(address) and address >= STACK_TOP - STACK_SIZE
-            return s.store(address, size, s.r[register] if on_stack else s.get(register))
-        value = s.load(address, size)
-        s.r[register] = extended(value, 8 * size, True) if with_sign else value
-    return execute
-
-
 def by_register(s, op):
-    return low(op, 0), add(s.get(low(op, 3)), s.get(low(op, 6)))
+    return at0(op), add(s.get(at3(op)), s.get(at6(op)))
 
 
 def by_offset(scale):
-    return lambda s, op: (low(op, 0), add(s.get(low(op, 3)), (op >> 6 & 31) * scale))
+    return lambda s, op: (at0(op), add(s.get(at3(op)), (op >> 6 & 31) * scale))
 
 
 def by_stack(s, op):
-    return low(op, 8), s.r[SP] + (op & 0xFF) * 4
+    return at8(op), s.r[SP] + (op & 0xFF) * 4
 
 
 def by_pc(s, op):
-    return low(op, 8), (s.r[PC] + 2 & ~3) + (op & 0xFF) * 4
+    return at8(op), (s.r[PC] + 2 & ~3) + (op & 0xFF) * 4
+
+
+def load(size, address_of, with_sign=False):
+    def execute(s, op):
+        d, address = address_of(s, op)
+        value = s.load(address, size)
+        s.r[d] = extended(value, 8 * size, True) if with_sign else value
+    return execute
+
+
+def store(size, address_of):
+    def execute(s, op):
+        d, address = address_of(s, op)
+        s.store(address, size, d)
+    return execute
 
 
 def listed(op):
-    return [register for register in range(8) if op >> register & 1]
+    return [one for one in range(8) if op >> one & 1]
 
 
 def push(s, op):
     registers = listed(op) + [LR] * (op >> 8 & 1)
     s.cycles += len(registers)
     s.move_stack(s.r[SP] - 4 * len(registers))
-    for index, register in enumerate(registers):
-        s.store(s.r[SP] + 4 * index, 4, s.r[register])
+    for index, one in enumerate(registers):
+        s.store(s.r[SP] + 4 * index, 4, one)
 
 
 def pop(s, op):
@@ -506,36 +484,37 @@ def pop(s, op):
     s.cycles += len(registers)
     values = [s.load(s.r[SP] + 4 * index, 4) for index in range(len(registers))]
     s.move_stack(s.r[SP] + 4 * len(registers))
-    for register, value in zip(registers, values):
-        if register == PC:
+    for one, value in zip(registers, values):
+        if one == PC:
             s.cycles += 2
-            return s.jump(value)
-        s.r[register] = value
+            s.jump(value)
+        else:
+            s.r[one] = value
 
 
 def stm(s, op):
-    n, registers = low(op, 8), listed(op)
+    n, registers = at8(op), listed(op)
+    if n in registers[1:]:
+        raise GivenUp("an STM that stores its own base")
     address = s.get(n)
+    for index, one in enumerate(registers):
+        s.store(add(address, 4 * index), 4, one)
     s.cycles += len(registers)
-    for index, register in enumerate(registers):
-        if register == n and index:
-            raise GivenUp("an STM that stores its own base")
-        s.store(add(address, 4 * index), 4, s.get(register))
     s.r[n] = add(address, 4 * len(registers))
 
 
 def ldm(s, op):
-    n, registers = low(op, 8), listed(op)
+    n, registers = at8(op), listed(op)
     address = s.get(n)
     values = [s.load(add(address, 4 * index), 4) for index in range(len(registers))]
     s.cycles += len(registers)
     s.r[n] = add(address, 4 * len(registers))
-    for register, value in zip(registers, values):
-        s.r[register] = value
+    for one, value in zip(registers, values):
+        s.r[one] = value
 
 
 def extend(bits, with_sign):
-    return lambda s, op: s.r.__setitem__(low(op, 0), extended(s.get(low(op, 3)), bits, with_sign))
+    return lambda s, op: s.r.__setitem__(at0(op), extended(s.get(at3(op)), bits, with_sign))
 
 
 def branch(s, op):
@@ -543,71 +522,64 @@ def branch(s, op):
 
 
 def branch_with_link(s, op):
-    """The two halves of a BL: the first is the upper half of `op`."""
-    upper, lower = op >> 16, op & 0xFFFF
-    sign = upper >> 10 & 1
-    j1, j2 = lower >> 13 & 1, lower >> 11 & 1
-    offset = (1 ^ j1 ^ sign) << 22 | (1 ^ j2 ^ sign) << 21 | (upper & 0x3FF) << 11 | lower & 0x7FF
+    """The two halves of a BL; the upper half of `op` is the first."""
+    sign = op >> 26 & 1
+    bits = [op >> bit & 1 ^ 1 ^ sign for bit in (13, 11)]
+    offset = bits[0] << 22 | bits[1] << 21 | (op >> 16 & 0x3FF) << 11 | op & 0x7FF
     s.r[LR] = s.r[PC] | 1
     s.r[PC] += 2 * (offset - (sign << 23))
 
 
-# Name, the bits that tell it, their values, cycles, what it does. A conditional branch is the machine's own.
+# Name, the bits that tell an instruction, their values, cycles, what it does. A conditional branch
+# is the machine's own.
 INSTRUCTIONS = [
     ("LSLS immediate", 0xF800, 0x0000, 1, shift_immediate("LSL")),
     ("LSRS immediate", 0xF800, 0x0800, 1, shift_immediate("LSR")),
     ("ASRS immediate", 0xF800, 0x1000, 1, shift_immediate("ASR")),
-    ("ADDS register", 0xFE00, 0x1800, 1,
-     lambda s, op: set_sum(s, low(op, 0), s.get(low(op, 3)), s.get(low(op, 6)))),
-    ("SUBS register", 0xFE00, 0x1A00, 1,
-     lambda s, op: set_difference(s, low(op, 0), s.get(low(op, 3)), s.get(low(op, 6)))),
-    ("ADDS 3 bits", 0xFE00, 0x1C00, 1, lambda s, op: set_sum(s, low(op, 0), s.get(low(op, 3)), low(op, 6))),
-    ("SUBS 3 bits", 0xFE00, 0x1E00, 1,
-     lambda s, op: set_difference(s, low(op, 0), s.get(low(op, 3)), low(op, 6))),
-    ("MOVS immediate", 0xF800, 0x2000, 1, lambda s, op: s.set_result(low(op, 8), op & 0xFF)),
-    ("CMP immediate", 0xF800, 0x2800, 1, lambda s, op: set_difference(s, None, s.get(low(op, 8)), op & 0xFF)),
-    ("ADDS 8 bits", 0xF800, 0x3000, 1, lambda s, op: set_sum(s, low(op, 8), s.get(low(op, 8)), op & 0xFF)),
-    ("SUBS 8 bits", 0xF800, 0x3800, 1,
-     lambda s, op: set_difference(s, low(op, 8), s.get(low(op, 8)), op & 0xFF)),
+    ("ADDS register", 0xFE00, 0x1800, 1, sum_of(at3, register(at6), at0)),
+    ("SUBS register", 0xFE00, 0x1A00, 1, difference_of(register(at3), register(at6), at0)),
+    ("ADDS 3 bits", 0xFE00, 0x1C00, 1, sum_of(at3, bits3, at0)),
+    ("SUBS 3 bits", 0xFE00, 0x1E00, 1, difference_of(register(at3), bits3, at0)),
+    ("MOVS immediate", 0xF800, 0x2000, 1, lambda s, op: s.set(at8(op), op & 0xFF)),
+    ("CMP immediate", 0xF800, 0x2800, 1, difference_of(register(at8), byte)),
+    ("ADDS 8 bits", 0xF800, 0x3000, 1, sum_of(at8, byte, at8)),
+    ("SUBS 8 bits", 0xF800, 0x3800, 1, difference_of(register(at8), byte, at8)),
     ("ANDS", 0xFFC0, 0x4000, 1, logical(bit_and)),
     ("EORS", 0xFFC0, 0x4040, 1, logical(bit_xor)),
     ("LSLS register", 0xFFC0, 0x4080, 1, shift_register("LSL")),
     ("LSRS register", 0xFFC0, 0x40C0, 1, shift_register("LSR")),
     ("ASRS register", 0xFFC0, 0x4100, 1, shift_register("ASR")),
-    ("ADCS", 0xFFC0, 0x4140, 1,
-     lambda s, op: add_with_carry(s, low(op, 0), s.get(low(op, 0)), s.get(low(op, 3)))),
-    ("SBCS", 0xFFC0, 0x4180, 1,
-     lambda s, op: add_with_carry(s, low(op, 0), s.get(low(op, 0)), bit_not(s.get(low(op, 3))))),
-    ("TST", 0xFFC0, 0x4200, 1, tst),
-    ("RSBS", 0xFFC0, 0x4240, 1, lambda s, op: set_difference(s, low(op, 0), 0, s.get(low(op, 3)))),
-    ("CMP register", 0xFFC0, 0x4280, 1,
-     lambda s, op: set_difference(s, None, s.get(low(op, 0)), s.get(low(op, 3)))),
-    ("CMN", 0xFFC0, 0x42C0, 1, lambda s, op: set_sum(s, None, s.get(low(op, 0)), s.get(low(op, 3)))),
+    ("ADCS", 0xFFC0, 0x4140, 1, with_carry(lambda b: b)),
+    ("SBCS", 0xFFC0, 0x4180, 1, with_carry(complement)),
+    ("TST", 0xFFC0, 0x4200, 1, logical(bit_and, keeps=False)),
+    ("RSBS", 0xFFC0, 0x4240, 1, difference_of(lambda s, op: 0, register(at3), at0)),
+    ("CMP register", 0xFFC0, 0x4280, 1, difference_of(register(at0), register(at3))),
+    ("CMN", 0xFFC0, 0x42C0, 1, sum_of(at0, register(at3))),
     ("ORRS", 0xFFC0, 0x4300, 1, logical(bit_or)),
     ("MULS", 0xFFC0, 0x4340, 1, logical(multiply)),
-    ("BICS", 0xFFC0, 0x4380, 1, logical(lambda a, b: bit_and(a, bit_not(b)))),
-    ("MVNS", 0xFFC0, 0x43C0, 1, logical(lambda _, b: bit_not(b))),
+    ("BICS", 0xFFC0, 0x4380, 1, logical(lambda a, b: bit_and(a, complement(b)))),
+    ("MVNS", 0xFFC0, 0x43C0, 1, logical(lambda _, b: complement(b))),
     ("ADD high", 0xFF00, 0x4400, 1, add_high),
-    ("CMP high", 0xFF00, 0x4500, 1, cmp_high),
+    ("CMP high", 0xFF00, 0x4500, 1, difference_of(register(high_d), register(high_m))),
     ("MOV high", 0xFF00, 0x4600, 1, mov_high),
     ("BX, BLX", 0xFF07, 0x4700, 2, bx),
-    ("LDR literal", 0xF800, 0x4800, 2, memory_access(4, True, by_pc)),
-    ("STR register", 0xFE00, 0x5000, 2, memory_access(4, False, by_register)),
-    ("STRH register", 0xFE00, 0x5200, 2, memory_access(2, False, by_register)),
-    ("STRB register", 0xFE00, 0x5400, 2, memory_access(1, False, by_register)),
-    ("LDRSB register", 0xFE00, 0x5600, 2, memory_access(1, True, by_register, True)),
-    ("LDR register", 0xFE00, 0x5800, 2, memory_access(4, True, by_register)),
-    ("LDRH register", 0xFE00, 0x5A00, 2, memory_access(2, True, by_register)),
-    ("LDRB register", 0xFE00, 0x5C00, 2, memory_access(1, True, by_register)),
-    ("LDRSH register", 0xFE00, 0x5E00, 2, memory_access(2, True, by_register, True)),
-    ("STR offset", 0xF800, 0x6000, 2, memory_access(4, False, by_offset(4))),
-    ("LDR offset", 0xF800, 0x6800, 2, memory_access(4, True, by_offset(4))),
-    ("STRB offset", 0xF800, 0x7000, 2, memory_access(1, False, by_offset(1))),
-    ("LDRB offset", 0xF800, 0x7800, 2, memory_access(1, True, by_offset(1))),
-    ("STRH offset", 0xF800, 0x8000, 2, memory_access(2, False, by_offset(2))),
-    ("LDRH offset", 0xF800, 0x8800, 2, memory_access(2, True, by_offset(2))),
-    ("STR stack", 0xF800, 0x9000, 2, memory_access(4, False, by_stack)),
-    ("LDR stack", 0xF800, 0x9800, 2, memory_access(4, True, by_stack)),
+    ("LDR literal", 0xF800, 0x4800, 2, load(4, by_pc)),
+    ("STR register", 0xFE00, 0x5000, 2, store(4, by_register)),
+    ("STRH register", 0xFE00, 0x5200, 2, store(2, by_register)),
+    ("STRB register", 0xFE00, 0x5400, 2, store(1, by_register)),
+    ("LDRSB register", 0xFE00, 0x5600, 2, load(1, by_register, True)),
+    ("LDR register", 0xFE00, 0x5800, 2, load(4, by_register)),
+    ("LDRH register", 0xFE00, 0x5A00, 2, load(2, by_register)),
+    ("LDRB register", 0xFE00, 0x5C00, 2, load(1, by_register)),
+    ("LDRSH register", 0xFE00, 0x5E00, 2, load(2, by_register, True)),
+    ("STR offset", 0xF800, 0x6000, 2, store(4, by_offset(4))),
+    ("LDR offset", 0xF800, 0x6800, 2, load(4, by_offset(4))),
+    ("STRB offset", 0xF800, 0x7000, 2, store(1, by_offset(1))),
+    ("LDRB offset", 0xF800, 0x7800, 2, load(1, by_offset(1))),
+    ("STRH offset", 0xF800, 0x8000, 2, store(2, by_offset(2))),
+    ("LDRH offset", 0xF800, 0x8800, 2, load(2, by_offset(2))),
+    ("STR stack", 0xF800, 0x9000, 2, store(4, by_stack)),
+    ("LDR stack", 0xF800, 0x9800, 2, load(4, by_stack)),
     ("ADR", 0xF800, 0xA000, 1, lambda s, op: s.r.__setitem__(*by_pc(s, op))),
     ("ADD stack address", 0xF800, 0xA800, 1, lambda s, op: s.r.__setitem__(*by_stack(s, op))),
     ("ADD SP", 0xFF80, 0xB000, 1, lambda s, op: s.move_stack(s.r[SP] + (op & 0x7F) * 4)),
@@ -631,7 +603,7 @@ def is_conditional(op):
 
 
 def decode(op):
-    """The row of the table of an encoding, which is of 32 bits if its upper half is one of BL."""
+    """The row of the table of an encoding, which is of 32 bits for a BL."""
     for row in INSTRUCTIONS:
         if op & row[1] == row[2] and (op > 0xFFFF) == (row[1] > 0xFFFF):
             return row
@@ -648,11 +620,11 @@ class Machine:
 
     def fetch(self, pc):
         if pc not in self.decoded:
-            op = Memory.constant(self, pc, 2)
+            op = number_at(self.segments, pc, 2)
             if op is None:
-                raise Broken(f"jumps to {pc:#x}, where the image has nothing")
+                raise Broken(f"a jump to {pc:#x}, where the image has nothing")
             if op >> 11 > 0x1C:
-                op = op << 16 | Memory.constant(self, pc + 2, 2)
+                op = op << 16 | (number_at(self.segments, pc + 2, 2) or 0)
             self.decoded[pc] = op, None if is_conditional(op) else decode(op)
         return self.decoded[pc]
 
@@ -727,7 +699,7 @@ class Machine:
             if not is_same(value, other.r[register]):
                 one.r[register] = Dropped(one.r[PC], register)
         for cell, value in one.memory.cells.items():
-            if cell < STACK_TOP - STACK_SIZE and not is_same(value, other.memory.cells[cell]):
+            if cell < STACK_END and not is_same(value, other.memory.cells[cell]):
                 one.memory.cells[cell] = z3.If(one.path, term(value), term(other.memory.cells[cell]))
         for ours, theirs in ((one.memory.read, other.memory.read), (one.memory.written, other.memory.written)):
             for cell in ours.keys() | theirs.keys():

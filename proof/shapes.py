@@ -10,8 +10,8 @@ from machine import Division, Memory
 BASE, DISTANCE = 0x20000000, 0x400  # where the arguments' arrays are
 
 # The most units of each argument in all calls, and in the quick ones; where a function is not named, in `ANY`.
-ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (6, 3),
-       "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (3, 1), "string": (9, 4),
+ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (5, 3),
+       "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (2, 1), "string": (9, 4),
        "des": (9, 5)}
 OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {"str": (16, 5)},
          "StrCopy": {"src": (16, 5)}, "StrCopyBuf": {"src": (16, 5)}, "StrNCopy": {"src": (16, 5)},
