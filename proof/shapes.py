@@ -20,6 +20,8 @@ OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {
          "WStrToStr": {"src": (3, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
          "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)},
          "StrNCatBuf": {"dst": (5, 3)}}
+# Also a long replacement, since the loop that copies it takes four units in an iteration.
+LONG_REPLACEMENT = {"orig": 2, "rep": 1, "with": 6}
 RADICES = 10, 16, 2, 3, 36, 37, 200, 65536, 1, 0, -1
 
 
