@@ -292,6 +292,7 @@ const Function<To, From>& find(const std::vector<Function<To, From>>& table, con
   for (const auto& function : table) {
     if (function.name == name) return function;
   }
+  FAIL("no row for " << name);
   std::abort();
 }
 
