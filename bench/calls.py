@@ -86,9 +86,9 @@ def find_string(fold=str):
         for end in "ab":
             pattern = "a" * (m - 1) + end
             patterns |= {pattern, pattern.upper()} if fold("A") == "a" else {pattern}
-    for start in "a", "aa", "aaa", "aaaa":  # then units that differ as the cases of a letter do
+    for start in "a", "aa", "aaa", "aaaa":  # then units that differ as the cases of a letter do,
         patterns.add(start + "@")
-        texts.append(start + "`")
+        texts += [start + "`", start + " "]  # also from the terminator of the pattern
     for pattern, string in product(sorted(patterns), texts):
         found = fold(string).find(fold(pattern))
         n = len(string) if found < 0 else found + len(pattern)
@@ -100,7 +100,8 @@ def compares(ignores_case=False, has_count=False):
     if ignores_case:
         pairs += [(string, string.upper()) for string in strings("x")]
         pairs += [(string.upper(), string) for string in strings("x")]
-    ends = ("", ""), ("1", "2"), ("@", "`"), ("x", ""), ("", "x"), ("A", "b"), ("b", "A")
+    ends = (("", ""), ("1", "2"), ("@", "`"), ("x", ""), ("", "x"), (" ", ""), ("", " "), ("A", "b"),
+            ("b", "A"))
     for (one, two), (end1, end2) in product(pairs, ends):
         if has_count:
             for count in counts_around(len(one)):
@@ -167,14 +168,14 @@ def arrays():
 
 def escapes():
     """With every capacity at which the last unit is the first that may not fit."""
-    written = {"x": 1, "\n": 6, "\uffff": 9}
+    written = {"x": 1, "\n": 6, "\ua003": 9, "\uaaad": 9}  # digits and letters take different paths
     for string in strings(*written):
         size = sum(written[unit] for unit in string)
         last = written[string[-1]] if string else 1
-        for capacity in (*range(size - last + 1, size + 2), INT_MAX):
+        for capacity in (*range(size - last + 1, max(size + 2, 12)), INT_MAX):
             yield (string, OUT, capacity), {"n": len(string)}
-    for unit in "\x80\u0100\u0fff\u1000~\x7f":
-        yield (unit, OUT, 20), {"n": 1}
+    for unit, capacity in product("\x80\u0100\u0fff\u1000\u1005\uffff~\x7f", (11, 12, 20)):
+        yield (unit, OUT, capacity), {"n": 1}
 
 
 def characters():
