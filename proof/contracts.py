@@ -570,3 +570,15 @@ FUNCTIONS = {
     "StrToWStr": (str_to_w_str, "src:text des:out bufsize:int"),
     "WStrToStr": (w_str_to_str, "src:text des:out bufsize:int"),
 }
+
+
+def expected(name, arguments):
+    """What a call of a narrow function gives: the result, and the units of each array afterwards. An
+    argument is a number, a list of units, or None for a null pointer. Of a pointer, the result is
+    1000 times the number of the argument, counted from 1, and the index in it."""
+    values = [Array(str(place), 1000 * place, 1, one) if isinstance(one, list) else one
+              for place, one in enumerate(arguments, 1)]
+    arrays = [one for one in values if isinstance(one, Array)]
+    call = Call(arrays)
+    result = FUNCTIONS[name][0](call, *values)
+    return result, [[call.unit(array, index) for index in range(len(array))] for array in arrays]
