@@ -1,5 +1,5 @@
-"""What each function returns, writes and may read, as include/strutil.h says it. Units, counts and results are
-numbers, or terms of the solver Z3 for any number: every rule here holds for both."""
+"""What each function returns, writes and may read, as include/strutil.h says it. Units, counts and
+results are numbers, or terms of the solver Z3 for any number: every rule here holds for both."""
 import z3
 
 MOST = 0x7FFFFFFF
@@ -22,12 +22,13 @@ class Array:
 
 
 class Call:
-    """What a call may do: when it may read a unit and when it writes one, by addresses; `cells` are the units
-    as they are by then, `needs` what the caller has to see to. `lengths` are those that its upper bound in
-    cycles depends on."""
+    """What a call may do: when it may read a unit and when it writes one, by addresses. `cells` are
+    the units as they are by then, `needs` what the caller has to see to, `lengths` those that its
+    upper bound in cycles depends on."""
 
     def __init__(self, arrays, divide=None):
-        self.cells = {array.place(index): unit for array in arrays for index, unit in enumerate(array.units)}
+        self.cells = {array.place(index): unit
+                      for array in arrays for index, unit in enumerate(array.units)}
         self.readable, self.written, self.needs, self.divide = {}, {}, [], divide
         self.lengths = {"n": 0, "d": 0, "m": 1, "w": 0, "r": 0}
 
@@ -126,14 +127,16 @@ def upper(unit):
 
 def is_in(text, unit):
     """Whether a text has the unit; it never has the terminator."""
-    return And(unit != 0, Or(*(And(when, one == unit) for one, when in zip(text.units, before_end(text)))))
+    members = zip(text.units, before_end(text))
+    return And(unit != 0, Or(*(And(when, one == unit) for one, when in members)))
 
 
 def begins_with(units, text, mapped=lambda unit: unit):
     matches = False
     for index in reversed(range(len(text))):
-        same = index < len(units) and And(mapped(units[index]) == mapped(text.units[index]), matches)
-        matches = Or(text.units[index] == 0, same)
+        goes_on = index < len(units) and \
+            And(mapped(units[index]) == mapped(text.units[index]), matches)
+        matches = Or(text.units[index] == 0, goes_on)
     return matches
 
 
@@ -405,7 +408,8 @@ def str_replace(call, orig, rep, with_, result):
             for at in range(len(result)):
                 call.write(result, at, orig.units[index], And(replaced, size == at))
                 for unit, is_unit, number in zip(with_.units, before_end(with_), range(at + 1)):
-                    call.write(result, at, unit, And(begins, is_unit, unit != 0, size + number == at))
+                    is_here = And(begins, is_unit, unit != 0, size + number == at)
+                    call.write(result, at, unit, is_here)
         size = size + If(begins, length(with_), If(is_free, 1, 0))
         passed = If(begins, length(rep) - 1, If(passed == 0, 0, passed - 1))
     call.lengths = {"n": If(is_real, length(orig), 0), "m": If(is_real, length(rep), 1), "d": 0,
@@ -419,7 +423,7 @@ def str_replace(call, orig, rep, with_, result):
 # Integer text conversion
 
 def int_to_str(call, value, string, radix):
-    """The radix is a number; whether the value is negative has to be the same for all values that it is."""
+    """The radix is a number. All values that are meant have the same sign."""
     if not string:
         return 0
     is_negative = call.decided(value < 0)
@@ -515,9 +519,11 @@ def w_str_to_str(call, src, des, bufsize):
             number = at - size
             digit = at - size - 4
             nibble = shifted_right(unit, 4 * (digits - 1 - digit)) & 15
-            escape = If(number == 0, ord("&"), If(number == 1, ord("("), If(number == 2, ord("0"), If(
-                number == 3, ord("x"), If(digit == digits, ord(")"), nibble + If(nibble < 10, 48, 87))))))
-            call.write(des, at, If(is_plain, unit, escape), And(fits, at >= size, at < size + wanted))
+            escape = If(digit == digits, ord(")"), nibble + If(nibble < 10, 48, 87))
+            for place, letter in enumerate("&(0x"):
+                escape = If(number == place, ord(letter), escape)
+            is_here = And(fits, at >= size, at < size + wanted)
+            call.write(des, at, If(is_plain, unit, escape), is_here)
         size = size + If(fits, wanted, 0)
     call.lengths["n"] = walked
     for at in range(des.__len__()):
@@ -564,3 +570,15 @@ FUNCTIONS = {
     "StrToWStr": (str_to_w_str, "src:text des:out bufsize:int"),
     "WStrToStr": (w_str_to_str, "src:text des:out bufsize:int"),
 }
+
+
+def expected(name, arguments):
+    """What a call of a narrow function gives: the result, and the units of each array afterwards. An
+    argument is a number, a list of units, or None for a null pointer. Of a pointer, the result is
+    1000 times the number of the argument, counted from 1, and the index in it."""
+    values = [Array(str(place), 1000 * place, 1, one) if isinstance(one, list) else one
+              for place, one in enumerate(arguments, 1)]
+    arrays = [one for one in values if isinstance(one, Array)]
+    call = Call(arrays)
+    result = FUNCTIONS[name][0](call, *values)
+    return result, [[call.unit(array, index) for index in range(len(array))] for array in arrays]

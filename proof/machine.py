@@ -611,8 +611,8 @@ def decode(op):
 
 
 class Machine:
-    """An image whose functions run from arguments that are any. `needed` is learned: at which place which
-    registers are read again, so that states that differ in one of them stay apart."""
+    """An image whose functions run from arguments that are any. `needed` is learned: at which place
+    which registers are read again, so that states that differ in one of them stay apart."""
 
     def __init__(self, segments, division=None):
         self.segments, self.division, self.division_of = segments, division, Division()
@@ -664,8 +664,9 @@ class Machine:
         return name
 
     def explore(self, start):
-        """Runs waiting states, first those that have loaded the fewest units, so that others meet them. A
-        path is checked to be possible where it is about to load: most branches can go both ways."""
+        """Runs waiting states, first those that have loaded the fewest units, so that others meet
+        them. A path is checked to be possible where it is about to load: most branches can go both
+        ways."""
         self.queue, self.waiting, ended = [], {}, []
         self.wait(start)
         while self.queue:
@@ -683,11 +684,12 @@ class Machine:
         return [state for state in ended if self.is_possible(state.path)]
 
     def wait(self, state):
-        """Puts a state among the waiting, or merges it into one that is at the same place with the same
-        values in the registers that matter and on the stack."""
-        pc = state.r[PC]
-        key = (pc, state.r[SP], tuple(identity(state.r[register]) for register in self.needed.get(pc, ())),
-               tuple(identity(state.memory.cells[cell]) for cell in range(state.r[SP], STACK_TOP, 4)))
+        """Puts a state among the waiting, or merges it into one that is at the same place with the
+        same values in the registers that matter and on the stack."""
+        pc, sp = state.r[PC], state.r[SP]
+        values = [state.r[register] for register in self.needed.get(pc, ())]
+        values += [state.memory.cells[cell] for cell in range(sp, STACK_TOP, 4)]
+        key = (pc, sp, *map(identity, values))
         if key in self.waiting:
             self.merge(self.waiting[key], state)
         else:
@@ -698,20 +700,22 @@ class Machine:
         for register, value in enumerate(one.r):
             if not is_same(value, other.r[register]):
                 one.r[register] = Dropped(one.r[PC], register)
-        for cell, value in one.memory.cells.items():
-            if cell < STACK_END and not is_same(value, other.memory.cells[cell]):
-                one.memory.cells[cell] = z3.If(one.path, term(value), term(other.memory.cells[cell]))
-        for ours, theirs in ((one.memory.read, other.memory.read), (one.memory.written, other.memory.written)):
-            for cell in ours.keys() | theirs.keys():
-                a, b = ours.get(cell, False), theirs.get(cell, False)
+        ours, theirs = one.memory, other.memory
+        for cell, value in ours.cells.items():
+            if cell < STACK_END and not is_same(value, theirs.cells[cell]):
+                ours.cells[cell] = z3.If(one.path, term(value), term(theirs.cells[cell]))
+        for mine, others in ((ours.read, theirs.read), (ours.written, theirs.written)):
+            for cell in mine.keys() | others.keys():
+                a, b = mine.get(cell, False), others.get(cell, False)
                 if not is_same(a, b):
-                    ours[cell] = z3.If(one.path, a, b)
+                    mine[cell] = z3.If(one.path, a, b)
         most = max(one.cycles, other.cycles)
         fewer = [add(state.fewer, most - state.cycles) for state in (one, other)]
         one.fewer = fewer[0] if is_same(*fewer) else z3.If(one.path, *map(term, fewer))
         one.path = self.named(z3.Or(one.path, other.path))
-        one.facts = {number: holds for number, holds in one.facts.items() if other.facts.get(number) == holds}
-        one.paused, one.is_checked = one.paused and other.paused, one.is_checked or other.is_checked
+        one.facts = dict(one.facts.items() & other.facts.items())
+        one.paused = one.paused and other.paused
+        one.is_checked = one.is_checked or other.is_checked
         one.cycles, one.lowest = most, min(one.lowest, other.lowest)
 
     def advance(self, s, ended):
@@ -745,8 +749,8 @@ class Machine:
         ended.append(s)
 
     def divide(self, s):
-        """The runtime's division by its contract: quotient and remainder, and all other registers that a
-        call may change are any. Its own cycles and stack are not counted."""
+        """The runtime's division by its contract: quotient and remainder; all other registers that
+        a call may change are any. Its own cycles and stack are not counted."""
         s.pause()
         dividend, divisor = s.get(0), s.get(1)
         if not is_number(divisor) or not 0 < signed(divisor):
@@ -793,7 +797,8 @@ class Machine:
         return True
 
     def assume(self, s, condition, holds):
-        s.path, s.is_checked = self.named(z3.And(s.path, condition if holds else z3.Not(condition))), False
+        s.path = self.named(z3.And(s.path, condition if holds else z3.Not(condition)))
+        s.is_checked = False
         if z3.is_not(condition):
             condition, holds = condition.arg(0), not holds
         self.kept.append(condition)  # so that no other term gets its number
@@ -817,12 +822,14 @@ def decided(s, condition):
 
 def identity(value):
     """What tells values in registers apart."""
-    return value.get_id() if isinstance(value, z3.AstRef) else value if is_number(value) else id(value)
+    if isinstance(value, z3.AstRef):
+        return "term", value.get_id()
+    return value if is_number(value) else id(value)
 
 
 class Division:
-    """Quotients and remainders of numbers that are not negative, also of terms: for these two new variables
-    stand, with what the division promises of them. The same dividend has the same ones."""
+    """Quotients and remainders. Those of a term, which is not negative, are two new variables, with
+    what the division promises of them. The same dividend has the same ones."""
 
     def __init__(self):
         self.found, self.most, self.promises = {}, {}, []
@@ -836,9 +843,10 @@ class Division:
             return self(dividend, divisor)
         key = dividend.get_id(), divisor
         if key not in self.found:
-            q, r = (z3.BitVec(f"{name} {len(self.found)}", 32) for name in ("quotient", "remainder"))
+            q, r = (z3.BitVec(f"{name} {len(self.found)}", 32) for name in ("quotient", "rest"))
             most = self.most.get(dividend.get_id(), 0x7FFFFFFF) // divisor
-            self.promises.append(z3.And(dividend == q * divisor + r, 0 <= r, r < divisor, 0 <= q, q <= most))
+            self.promises.append(z3.And(dividend == q * divisor + r, 0 <= r, r < divisor,
+                                        0 <= q, q <= most))
             self.found[key] = dividend, q, r
             self.most[q.get_id()] = most
         return self.found[key][1:]

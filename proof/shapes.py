@@ -1,6 +1,6 @@
-"""The calls that are proved of each function: its arguments with any contents up to a size, in each variant:
-which pointers are null, are the same, overlap or are not aligned to words."""
-from itertools import chain, combinations
+"""The calls that are proved of each function: its arguments with any contents up to a size, in each
+variant: which pointers are null, are the same, overlap or are not aligned to words."""
+from itertools import combinations
 
 import z3
 
@@ -9,14 +9,16 @@ from machine import Division, Memory
 
 BASE, DISTANCE = 0x20000000, 0x400  # where the arguments' arrays are
 
-# The most units of each argument in all calls, and in the quick ones; where a function is not named, in `ANY`.
+# The most units of each argument, in all calls and in the quick ones; in `OTHER` where a function
+# has its own.
 ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (5, 3),
-       "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (2, 1), "string": (9, 4),
-       "des": (9, 5)}
+       "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (2, 1),
+       "string": (9, 4), "des": (9, 5)}
 OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {"str": (16, 5)},
          "StrCopy": {"src": (16, 5)}, "StrCopyBuf": {"src": (16, 5)}, "StrNCopy": {"src": (16, 5)},
          "StrChr": {"str": (32, 9)}, "StrCmp": {"str1": (16, 5), "str2": (16, 5)},
-         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"substr": (5, 3)}, "StrSplit": {"str": (6, 4), "dlmt": (3, 2)},
+         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"substr": (5, 3)},
+         "StrSplit": {"str": (6, 4), "dlmt": (3, 2)},
          "WStrToStr": {"src": (3, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
          "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)},
          "StrNCatBuf": {"dst": (5, 3)}}
@@ -44,7 +46,9 @@ def units_of(name, argument):
 def sizes(name, is_quick):
     own = OTHER.get(narrow(name), {})
     kinds = dict(one.split(":") for one in FUNCTIONS[narrow(name)][1].split())
-    return {one: own.get(one, ANY[one])[is_quick] for one in kinds if one in ANY and "radix" not in kinds}
+    if "radix" in kinds:
+        return {}
+    return {one: own.get(one, ANY[one])[is_quick] for one in kinds if one in ANY}
 
 
 def variants(name):
@@ -52,8 +56,9 @@ def variants(name):
     kinds = dict(one.split(":") for one in FUNCTIONS[narrow(name)][1].split())
     pointers = [one for one, kind in kinds.items() if kind not in ("int", "unit")]
     yield {}
-    for some in chain.from_iterable(combinations(pointers, count) for count in range(1, len(pointers) + 1)):
-        yield dict.fromkeys(some, "null")
+    for count in range(1, len(pointers) + 1):
+        for some in combinations(pointers, count):
+            yield dict.fromkeys(some, "null")
     if "str2" in kinds:
         yield {"str2": ("same", "str1")}
     if narrow(name) in ("StrCopy", "StrCopyBuf", "StrNCopy"):
@@ -86,17 +91,16 @@ def int_variants(is_quick):
 
 
 class Shape:
-    """The arguments of a call of a variant: for the machine `registers` and `memory`, for the contract
-    `arguments`; what the contract says of them is `call` and `expected`."""
+    """The arguments of a call of a variant: for the machine `registers` and `memory`, for the
+    contract `arguments`; what the contract says of them is `call` and `expected`."""
 
     def __init__(self, name, variant, most, segments):
         self.name, self.variant, self.most = name, variant, most
         contract, signature = FUNCTIONS[narrow(name)]
         self.kinds = dict(one.split(":") for one in signature.split())
         self.arrays, self.conditions, self.values = [], [], {}
-        places = list(self.kinds)
-        places.sort(key=lambda one: isinstance(variant.get(one), tuple))  # those that another is needed for
-        for argument in places:
+        # Last those that depend on another argument.
+        for argument in sorted(self.kinds, key=lambda one: isinstance(variant.get(one), tuple)):
             self.values[argument] = self.make(argument, list(self.kinds).index(argument))
         self.arguments = [self.values[argument] for argument in self.kinds]
         self.divide = Division()
@@ -205,4 +209,5 @@ def offset_of(variant):
 
 def unknown(name, size):
     """Any unit of so many bytes."""
-    return z3.BitVec(name, 32) if size == 4 else z3.ZeroExt(32 - 8 * size, z3.BitVec(name, 8 * size))
+    some = z3.BitVec(name, 8 * size)
+    return some if size == 4 else z3.ZeroExt(32 - 8 * size, some)
