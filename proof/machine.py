@@ -17,7 +17,7 @@ STACK_TOP, STACK_SIZE = 0x20008000, 256
 STACK_END = STACK_TOP - STACK_SIZE
 KEPT = (4, 5, 6, 7, 8, 9, 10, 11, SP)
 STEP_LIMIT = 1000000
-CHECK_LIMIT = 100000000  # what one question to the solver may take, in units of its own
+CHECK_LIMIT = 1000000000  # what one question to the solver may take, in units of its own
 
 
 class GivenUp(Exception):

@@ -11,15 +11,15 @@ BASE, DISTANCE = 0x20000000, 0x400  # where the arguments' arrays are
 
 # The most units of each argument, in all calls and in the quick ones; in `OTHER` where a function
 # has its own.
-ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (5, 3),
+ANY = {"str": (9, 5), "src": (9, 5), "dst": (9, 4), "str1": (9, 5), "str2": (9, 5), "orig": (4, 3),
        "substr": (5, 5), "dlmt": (5, 2), "trimSet": (5, 2), "rep": (3, 2), "with": (2, 1),
        "string": (9, 4), "des": (9, 5)}
 OTHER = {"StrLen": {"str": (64, 9)}, "StrUpper": {"str": (16, 5)}, "StrLower": {"str": (16, 5)},
          "StrCopy": {"src": (16, 5)}, "StrCopyBuf": {"src": (16, 5)}, "StrNCopy": {"src": (16, 5)},
          "StrChr": {"str": (32, 9)}, "StrCmp": {"str1": (16, 5), "str2": (16, 5)},
-         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"substr": (5, 3)},
+         "StrNCmp": {"str1": (16, 5), "str2": (16, 5)}, "StrIStr": {"str": (7, 5), "substr": (4, 3)},
          "StrSplit": {"str": (6, 4), "dlmt": (3, 2)},
-         "WStrToStr": {"src": (3, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
+         "WStrToStr": {"src": (2, 1)}, "BytesToWords": {"src": (16, 6), "des": (16, 6)},
          "WStrToWords": {"src": (18, 18), "des": (18, 18)}, "StrToWStr": {"src": (16, 5)},
          "StrNCatBuf": {"dst": (5, 3)}}
 # Also a long replacement, since the loop that copies it takes four units in an iteration.
