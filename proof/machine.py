@@ -244,14 +244,15 @@ def number_at(segments, address, size):
 
 class State:
     """A moment of some paths. `path` is true in the solver where the contents take one of them, and
-    `facts` are what they have in common: numbers of conditions and whether these hold, numbers of
-    terms and their values. `cycles` are the most of any path, `fewer` by how many a path took less,
-    `lowest` is the lowest stack pointer, `loads` are counted from paced cells."""
+    `facts` are what they have in common: conditions, by number, and whether they hold. `settled` is
+    the number of a term and its value, for the instruction that needs it. `cycles` are the most of
+    any path, `fewer` by how many a path took less, `lowest` is the lowest stack pointer, `loads`
+    are counted from paced cells."""
 
     def __init__(self, registers, memory, path):
         self.r, self.memory, self.path = registers, memory, path
         self.cycles, self.fewer, self.lowest, self.loads, self.facts = 0, 0, STACK_TOP, 0, {}
-        self.paused, self.is_checked = False, False
+        self.paused, self.is_checked, self.settled = False, False, (None, None)
 
     def copy(self):
         other = State(list(self.r), self.memory.copy(), self.path)
@@ -269,9 +270,9 @@ class State:
         """The value of a term, of which there is one in this state."""
         if is_number(value):
             return value
-        if value.get_id() not in self.facts:
+        if value.get_id() != self.settled[0]:
             raise Unsettled(value)
-        return self.facts[value.get_id()]
+        return self.settled[1]
 
     def place(self, address):
         address = self.number(address)
@@ -689,7 +690,7 @@ class Machine:
         pc, sp = state.r[PC], state.r[SP]
         values = [state.r[register] for register in self.needed.get(pc, ())]
         values += [state.memory.cells[cell] for cell in range(sp, STACK_TOP, 4)]
-        key = (pc, sp, *map(identity, values))
+        key = (pc, sp, state.settled, *map(identity, values))
         if key in self.waiting:
             self.merge(self.waiting[key], state)
         else:
@@ -737,7 +738,7 @@ class Machine:
                         continue
                     row[4](s, op)
                     s.cycles += row[3]
-                s.paused = False
+                s.paused, s.settled = False, (None, None)
             except Pause:
                 s.r[PC], s.paused = pc, True
                 return self.wait(s)
@@ -772,7 +773,7 @@ class Machine:
         if self.is_possible(s.path):
             one, rest = self.solver.model().eval(value, True), s.copy()
             self.assume(s, value == one, True)
-            s.facts[value.get_id()] = one.as_long()
+            s.settled = value.get_id(), one.as_long()
             s.r = [one.as_long() if is_same(register, value) else register for register in s.r]
             self.assume(rest, value == one, False)
             rest.paused = s.paused
