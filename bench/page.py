@@ -11,12 +11,21 @@ TITLES = {**costs.BUILDS, "gcc-O3": "GCC -O3", "gcc-O0": "GCC -O0", "clang-O0": 
           "loop": "naive loop"}
 BUILDS = "gcc-O2", "clang-O2", "gcc-Os"  # that the tables of cycles have
 LOOPS = "loops-Os", "loops-O2", "loops-O3"
-README = re.compile(r"(<!-- figures: .* -->\n).*?(<!-- end of figures -->)", re.S)
+MARKED = re.compile(r"(<!-- figures: .* -->\n).*?(<!-- end of figures -->)", re.S)
 
 
 def table(heads, lines):
     rule = ["---"] + ["--:"] * (len(heads) - 1)
     return "".join(f"| {' | '.join(map(str, line))} |\n" for line in [heads, rule, *lines])
+
+
+def with_figures(file, figures):
+    """The text of a file with other figures between the two lines that mark them."""
+    text, count = MARKED.subn(lambda found: found[1] + figures + found[2], file.read_text())
+    if count != 1:
+        raise SystemExit(f"{file} must have the lines <!-- figures: ... --> and "
+                         f"<!-- end of figures --> once; they are there {count} times")
+    return text
 
 
 def names(function):
@@ -133,12 +142,7 @@ def make(source, stated, measured, versions, promised):
         bound_tables=bound_tables(stated),
         comparison_table=comparison_table(measured, SIZES, (16, 256)),
         digit_comparison=comparison_table(measured, DIGIT_SIZES, (4, 10)))
-    readme, count = README.subn(
-        lambda found: found[1] + readme_table(measured, promised) + found[2],
-        (source / "README.md").read_text())
-    if count != 1:
-        raise SystemExit("README.md must have the lines <!-- figures: ... --> and "
-                         f"<!-- end of figures --> once; they are there {count} times")
+    readme = with_figures(source / "README.md", readme_table(measured, promised))
     return {"docs/performance.md": page, "docs/performance.svg": chart(measured),
             "README.md": readme}
 

@@ -429,7 +429,7 @@ def int_to_str(call, value, string, radix):
     is_negative = call.decided(value < 0)
     rest, digits = -value if is_negative else value, []
     if radix > 1:
-        for _ in range(len(string) - 2):
+        for _ in range(min(32, len(string) - 1 - is_negative)):
             rest, digit = divmod(rest, radix) if isinstance(rest, int) else call.divide(rest, radix)
             unit = If(digit < 10, 48 + digit, 87 + digit)
             digits.append((unit & (0xFF if string.size == 1 else 0xFFFF), rest != 0))
@@ -516,13 +516,15 @@ def w_str_to_str(call, src, des, bufsize):
         walked = walked + If(And(fits, when, unit != 0), 1, 0)
         fits = And(fits, when, unit != 0, size + wanted < bufsize)
         for at in range(des.__len__()):
+            is_here = And(fits, at >= size, at < size + wanted)
+            if is_here is False:
+                continue
             number = at - size
             digit = at - size - 4
             nibble = shifted_right(unit, 4 * (digits - 1 - digit)) & 15
             escape = If(digit == digits, ord(")"), nibble + If(nibble < 10, 48, 87))
             for place, letter in enumerate("&(0x"):
                 escape = If(number == place, ord(letter), escape)
-            is_here = And(fits, at >= size, at < size + wanted)
             call.write(des, at, If(is_plain, unit, escape), is_here)
         size = size + If(fits, wanted, 0)
     call.lengths["n"] = walked
@@ -572,13 +574,18 @@ FUNCTIONS = {
 }
 
 
-def expected(name, arguments):
-    """What a call of a narrow function gives: the result, and the units of each array afterwards. An
-    argument is a number, a list of units, or None for a null pointer. Of a pointer, the result is
-    1000 times the number of the argument, counted from 1, and the index in it."""
-    values = [Array(str(place), 1000 * place, 1, one) if isinstance(one, list) else one
-              for place, one in enumerate(arguments, 1)]
+def narrow(name):
+    """The name of which a function has the contract."""
+    if name == "IntToWStr":
+        return "IntToStr"
+    return name if name in FUNCTIONS else name[1:]
+
+
+def expected(name, values):
+    """What a call returns, with numbers, and with arrays of numbers, which it changes."""
     arrays = [one for one in values if isinstance(one, Array)]
     call = Call(arrays)
-    result = FUNCTIONS[name][0](call, *values)
-    return result, [[call.unit(array, index) for index in range(len(array))] for array in arrays]
+    result = FUNCTIONS[narrow(name)][0](call, *values)
+    for array in arrays:
+        array.units = [call.unit(array, index) for index in range(len(array))]
+    return result or 0

@@ -303,8 +303,8 @@ class State:
         self.r[register], self.r[FLAGS] = value, Flags(value, self.r[FLAGS], carry=carry)
 
     def move_stack(self, value):
-        if not is_number(value):
-            raise GivenUp("a stack pointer that is no number")
+        if not is_number(value) or value % 4:
+            raise GivenUp("a stack pointer that is no number, or not aligned")
         self.r[SP], self.lowest = value, min(self.lowest, value)
 
     def jump(self, target):
@@ -411,13 +411,14 @@ def shift_register(kind):
 
 def mov_high(s, op):
     d, m = high_d(op), high_m(op)
+    value = s.r[PC] + 2 if m == PC else s.get(m) if d in (PC, SP) else s.r[m]
     if d == PC:
         s.cycles += 1
-        s.jump(bit_or(s.get(m), 1))
+        s.jump(bit_or(value, 1))
     elif d == SP:
-        s.move_stack(s.get(m))
+        s.move_stack(value)
     else:
-        s.r[d] = s.r[PC] + 2 if m == PC else s.r[m]
+        s.r[d] = value
 
 
 def add_high(s, op):
