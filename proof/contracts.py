@@ -3,6 +3,7 @@ results are numbers, or terms of the solver Z3 for any number: every rule here h
 import z3
 
 MOST = 0x7FFFFFFF
+EMPTY = "an empty string"  # a result that is a pointer to one in the image
 
 
 class Array:
@@ -503,7 +504,7 @@ def str_to_w_str(call, src, des, bufsize):
 
 def w_str_to_str(call, src, des, bufsize):
     if not des:
-        return None
+        return EMPTY
     if not src:
         call.write(des, 0, 0)
         return des.address
