@@ -583,7 +583,8 @@ def narrow(name):
 
 
 def expected(name, values):
-    """What a call returns, with numbers, and with arrays of numbers, which it changes."""
+    """What a call returns, or 0, with numbers as arguments, and arrays of numbers, which it
+    changes."""
     arrays = [one for one in values if isinstance(one, Array)]
     call = Call(arrays)
     result = FUNCTIONS[narrow(name)][0](call, *values)
